@@ -1,0 +1,50 @@
+# make run       build, then run the main job on the bundled example
+# make test      build and run every test
+# make build     release programs in build/release/bin/
+# make sanitize  every test under the address and undefined-behaviour sanitizers
+# make lint      formatting, clang-tidy, the order of the folders
+# make bench     the speed table
+# make fuzz      each fuzz target for FUZZ_SECONDS seconds (default 600)
+
+JOBS ?= $(shell nproc)
+FUZZ_SECONDS ?= 600
+
+.PHONY: run test build sanitize lint bench fuzz format packages clean
+.DEFAULT_GOAL := build
+
+packages:
+	@tools/install-packages
+
+# A build is configured anew only when its preset has no cache yet; CMake follows changes itself.
+build/%/build.ninja: CMakePresets.json | packages
+	cmake --preset $*
+
+build: build/release/build.ninja
+	cmake --build build/release -j $(JOBS)
+
+run: build
+	examples/run build/release/bin
+
+test: build/dev/build.ninja
+	cmake --build build/dev -j $(JOBS)
+	ctest --test-dir build/dev -j $(JOBS) --output-on-failure
+
+sanitize: build/sanitize/build.ninja
+	cmake --build build/sanitize -j $(JOBS)
+	ctest --test-dir build/sanitize -j $(JOBS) --output-on-failure
+
+lint: build/dev/build.ninja
+	cmake --build build/dev -j $(JOBS) --target lint
+
+format: packages
+	git ls-files '*.cpp' '*.h' | xargs clang-format-14 -i
+
+bench: build
+	bench/run build/release/bin
+
+fuzz: build/fuzz/build.ninja
+	cmake --build build/fuzz -j $(JOBS)
+	fuzz/run build/fuzz $(FUZZ_SECONDS)
+
+clean:
+	rm -rf build

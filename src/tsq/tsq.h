@@ -1,0 +1,154 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+
+#include "base/status.h"
+
+/// The store of one-dimensional data files (.tsq0, .tq0): a time axis and one or more items with a
+/// value for each time step. docs/formats/tsq.md describes the file, which is netCDF with CF
+/// conventions. Operations return 0 on success and another value on failure unless told otherwise;
+/// the reason of the last failure is tsqLastError. A null handle fails.
+///
+/// Reading and writing go step by step, and behind them the store works in blocks.
+namespace ryn {
+
+struct TsqHeader;
+struct TsqFile;
+struct TsqItem;
+
+struct TsqHeaderDelete {
+    void operator()(TsqHeader* header) const;
+};
+struct TsqFileDelete {
+    void operator()(TsqFile* file) const;
+};
+using TsqHeaderHandle = std::unique_ptr<TsqHeader, TsqHeaderDelete>;
+using TsqFileHandle = std::unique_ptr<TsqFile, TsqFileDelete>;
+
+inline constexpr int kTsqDataTypeFloat = 1; ///< 32-bit float
+
+/// Answers of tsqGetTimeAxisType.
+enum TsqAxisType : int {
+    kTsqEqTimeAxis = 1,      ///< equidistant relative
+    kTsqNeqTimeAxis = 2,     ///< non-equidistant relative
+    kTsqEqCalendarAxis = 3,  ///< equidistant calendar
+    kTsqNeqCalendarAxis = 4, ///< non-equidistant calendar
+};
+
+// Reading.
+
+/// Opens a file of ours or any netCDF file with items along one time axis. On failure both handles
+/// stay null. Refused with a reason: no netCDF, no time axis, counts that disagree with the file,
+/// more than 2^31 - 1 steps.
+int tsqFileRead(const std::string& path, TsqHeaderHandle* header, TsqFileHandle* file);
+/// 0 for a header without an axis.
+int tsqGetTimeAxisType(const TsqHeader* header);
+// Axis operations: each answers for its own axis type and fails, outputs unchanged, for another.
+// Null outputs are passed over. `start` and `step` are in the axis's unit, `span` is the time of
+// the last step, `count` the number of time steps, `index` the number given when the axis was set.
+// Dates are "YYYY-MM-DD", times "HH:MM:SS".
+int tsqGetEqTimeAxis(const TsqHeader* header, int* unit, std::string* unitText, double* start,
+                     double* step, int* count, int* index);
+int tsqGetNeqTimeAxis(const TsqHeader* header, int* unit, std::string* unitText, double* start,
+                      double* span, int* count, int* index);
+int tsqGetEqCalendarAxis(const TsqHeader* header, std::string* dateText, std::string* timeText,
+                         int* unit, std::string* unitText, double* start, double* step, int* count,
+                         int* index);
+int tsqGetNeqCalendarAxis(const TsqHeader* header, std::string* dateText, std::string* timeText,
+                          int* unit, std::string* unitText, double* start, double* span, int* count,
+                          int* index);
+int tsqGetNoOfItems(const TsqHeader* header);
+/// Item by number, from 1; null when there is none.
+TsqItem* tsqItemD(TsqHeader* header, int itemNumber);
+/// Null outputs are passed over.
+int tsqGetItemInfo(const TsqItem* item, int* type, std::string* typeText, std::string* name,
+                   int* unit, std::string* unitText, int* dataType);
+/// Number of spatial dimensions of an item: 0 for a plain series.
+int tsqGetItemDimensions(const TsqItem* item);
+std::string tsqGetFileTitle(const TsqHeader* header);
+/// The file's delete value.
+float tsqGetDeleteValFloat(const TsqHeader* header);
+/// Counts the values of an item that are marked missing or not finite, in a file that another
+/// program made (fill value, missing value, NaN); always 0 in a file of ours, whose delete value is
+/// an ordinary value to this system.
+int tsqCountMissing(TsqHeader* header, TsqFile* file, int itemNumber, int* missing);
+/// Places the file at the first time step.
+int tsqFindBlockDynamic(TsqHeader* header, TsqFile* file);
+/// Reads the next item of the current time step, in item order, and the time of the step in the
+/// axis's unit. A null buffer passes over the item without reading it; a null time likewise. An
+/// item with spatial dimensions fills so many values.
+int tsqReadItemTimeStep(TsqHeader* header, TsqFile* file, double* time, float* buffer);
+
+// Writing.
+
+int tsqHeaderCreate(int fileType, const std::string& title, const std::string& applicationName,
+                    int applicationVersion, int numberOfItems, int statisticsKind,
+                    TsqHeaderHandle* header);
+int tsqSetAppTitle(TsqHeader* header, const std::string& text);
+int tsqSetDeleteValFloat(TsqHeader* header, float value);
+int tsqSetDeleteValDouble(TsqHeader* header, double value);
+int tsqSetEqTimeAxis(TsqHeader* header, int unit, double start, double step, int index);
+int tsqSetNeqTimeAxis(TsqHeader* header, int unit, double start, int index);
+int tsqSetEqCalendarAxis(TsqHeader* header, const std::string& dateText,
+                         const std::string& timeText, int unit, double start, double step,
+                         int index);
+int tsqSetNeqCalendarAxis(TsqHeader* header, const std::string& dateText,
+                          const std::string& timeText, int unit, double start, int index);
+int tsqSetDataType(TsqHeader* header, int number);
+int tsqSetGeoInfoUTMProj(TsqHeader* header, const std::string& projection, double longitude,
+                         double latitude, double rotation);
+int tsqSetItemInfo(TsqHeader* header, TsqItem* item, int type, const std::string& name, int unit,
+                   int dataType);
+int tsqSetItemValueType(TsqItem* item, int kind);
+int tsqSetItemRefCoords(TsqItem* item, float x, float y, float z);
+int tsqSetItemAxisOrientation(TsqItem* item, float alpha, float phi, float theta);
+/// No spatial axes.
+int tsqSetItemAxisEqD0(TsqItem* item, int unit);
+/// Two equidistant spatial axes.
+int tsqSetItemAxisEqD2(TsqItem* item, int unit, int sizeX, int sizeY, float originX, float originY,
+                       float stepX, float stepY);
+/// Makes the file: it takes its name when it is closed, so that an old file stands until then.
+int tsqFileCreate(const std::string& path, TsqHeader* header, TsqFileHandle* file);
+/// Appends the next item of the current time step. The time counts with the first item of a step
+/// and is stored rounded to the millisecond; it must be finite.
+int tsqWriteItemTimeStep(TsqHeader* header, TsqFile* file, double time, const float* values);
+
+/// Closes; a file being written is completed and takes its name here. A null file is no error.
+int tsqFileClose(TsqHeader* header, TsqFileHandle* file);
+void tsqHeaderDestroy(TsqHeaderHandle* header);
+
+// Errors.
+
+/// Why the last operation that failed did so; names the file. Ok when none did since the last call.
+Status tsqTakeError();
+
+/// Gets an error's type, the library's source file and its line; returns 0.
+using TsqErrorHandler = std::function<int(int type, const char* sourceFile, int line)>;
+/// Installs the handler that is called for each library error while a file is made or written; an
+/// empty one removes it. Returns the handler that was installed before.
+TsqErrorHandler tsqAddCommonErrorHandler(TsqErrorHandler handler);
+
+/// While an object lives, every data file whose absolute path lies in its directory exists in
+/// memory alone, under the same operations: nothing reaches the disk.
+class TsqMemoryDirectory {
+  public:
+    explicit TsqMemoryDirectory(const std::string& directory);
+    ~TsqMemoryDirectory();
+    TsqMemoryDirectory(const TsqMemoryDirectory&) = delete;
+    TsqMemoryDirectory& operator=(const TsqMemoryDirectory&) = delete;
+
+    /// Removes one file; false when there is none.
+    bool Remove(const std::string& path);
+    /// Bytes held.
+    std::size_t Size() const;
+
+  private:
+    std::string directory;
+};
+
+/// Copies a data file, from memory to disk too.
+Status tsqCopyFile(const std::string& from, const std::string& to);
+
+} // namespace ryn
