@@ -47,13 +47,6 @@ bool FieldsInRange(const COleDateTime::Fields& f) {
            f.minute >= 0 && f.minute <= 59 && f.second >= 0 && f.second <= 59;
 }
 
-double LinearFromStored(double stored) {
-    if (stored > -COleDateTime::kHalfSecond)
-        return stored;
-    const double whole = std::ceil(stored);
-    return whole - (stored - whole);
-}
-
 void AppendPadded(std::string* text, int value, std::size_t width) {
     const std::string digits = std::to_string(value);
     if (digits.size() < width)
@@ -73,9 +66,10 @@ int DaysInMonth(int year, int month) {
 }
 
 COleDateTime::COleDateTime(double dayCount) {
-    const double linear = LinearFromStored(dayCount);
-    if (linear >= kFirstDay && linear < kPastLastDay) // false for NaN
-        count = dayCount;
+    count = dayCount;
+    const double linear = LinearCount();
+    if (!(linear >= kFirstDay && linear < kPastLastDay)) // true for NaN
+        count = std::numeric_limits<double>::quiet_NaN();
 }
 
 COleDateTime::COleDateTime(int year, int month, int day, int hour, int minute, int second) {
@@ -170,30 +164,6 @@ COleDateTime COleDateTime::operator-(COleDateTimeSpan span) const {
 
 COleDateTimeSpan COleDateTime::operator-(const COleDateTime& other) const {
     return COleDateTimeSpan(LinearCount() - other.LinearCount());
-}
-
-bool operator==(const COleDateTime& a, const COleDateTime& b) {
-    return std::fabs(a.LinearCount() - b.LinearCount()) < COleDateTime::kHalfSecond;
-}
-
-bool operator!=(const COleDateTime& a, const COleDateTime& b) {
-    return a.IsValid() && b.IsValid() && !(a == b);
-}
-
-bool operator<(const COleDateTime& a, const COleDateTime& b) {
-    return a.LinearCount() < b.LinearCount();
-}
-
-bool operator>(const COleDateTime& a, const COleDateTime& b) {
-    return b < a;
-}
-
-bool operator<=(const COleDateTime& a, const COleDateTime& b) {
-    return a < b || a == b;
-}
-
-bool operator>=(const COleDateTime& a, const COleDateTime& b) {
-    return a > b || a == b;
 }
 
 } // namespace ryn

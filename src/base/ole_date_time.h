@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cmath>
 #include <limits>
 #include <string>
 #include <string_view>
@@ -54,7 +55,12 @@ class COleDateTime {
     /// The stored day count; NaN when invalid.
     double DayCount() const { return count; }
     /// Days since 30 December 1899 as a number without the sign rule above; NaN when invalid.
-    double LinearCount() const;
+    double LinearCount() const {
+        if (count > -kHalfSecond)
+            return count;
+        const double whole = std::ceil(count);
+        return whole - (count - whole);
+    }
 
     Fields GetFields() const;
     int GetYear() const { return GetFields().year; }
@@ -73,12 +79,18 @@ class COleDateTime {
     /// The difference of the linear counts; NaN days when either is invalid.
     COleDateTimeSpan operator-(const COleDateTime& other) const;
 
-    friend bool operator==(const COleDateTime& a, const COleDateTime& b);
-    friend bool operator!=(const COleDateTime& a, const COleDateTime& b);
-    friend bool operator<(const COleDateTime& a, const COleDateTime& b);
-    friend bool operator>(const COleDateTime& a, const COleDateTime& b);
-    friend bool operator<=(const COleDateTime& a, const COleDateTime& b);
-    friend bool operator>=(const COleDateTime& a, const COleDateTime& b);
+    friend bool operator==(const COleDateTime& a, const COleDateTime& b) {
+        return std::fabs(a.LinearCount() - b.LinearCount()) < kHalfSecond;
+    }
+    friend bool operator!=(const COleDateTime& a, const COleDateTime& b) {
+        return a.IsValid() && b.IsValid() && !(a == b);
+    }
+    friend bool operator<(const COleDateTime& a, const COleDateTime& b) {
+        return a.LinearCount() < b.LinearCount();
+    }
+    friend bool operator>(const COleDateTime& a, const COleDateTime& b) { return b < a; }
+    friend bool operator<=(const COleDateTime& a, const COleDateTime& b) { return a < b || a == b; }
+    friend bool operator>=(const COleDateTime& a, const COleDateTime& b) { return a > b || a == b; }
 
     /// Half a second in days: 0.5 / 86400.
     static constexpr double kHalfSecond = 5.787037037037037e-6;

@@ -77,7 +77,7 @@ int tsqCountMissing(TsqHeader* header, TsqFile* file, int itemNumber, int* missi
 /// Places the file at the first time step.
 int tsqFindBlockDynamic(TsqHeader* header, TsqFile* file);
 /// Reads the next item of the current time step, in item order, and the time of the step in the
-/// axis's unit. A null buffer passes over the item without reading it; a null time likewise. An
+/// axis's unit. A value that another program marked as missing comes as NaN. A null buffer passes over the item without reading it; a null time likewise. An
 /// item with spatial dimensions fills so many values.
 int tsqReadItemTimeStep(TsqHeader* header, TsqFile* file, double* time, float* buffer);
 
