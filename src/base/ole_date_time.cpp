@@ -82,10 +82,6 @@ COleDateTime::COleDateTime(int year, int month, int day, int hour, int minute, i
     count = whole >= 0.0 ? whole + fraction : whole - fraction;
 }
 
-double COleDateTime::LinearCount() const {
-    return LinearFromStored(count);
-}
-
 COleDateTime::Fields COleDateTime::GetFields() const {
     Fields fields;
     if (!IsValid())
