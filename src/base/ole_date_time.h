@@ -103,6 +103,12 @@ class COleDateTime {
     double count = std::numeric_limits<double>::quiet_NaN();
 };
 
+/// True when a lies before b by half a second or more. Sums of day fractions are off by some 1e-11
+/// days; this keeps a moment that was computed in two ways from lying before itself.
+inline bool IsClearlyBefore(const COleDateTime& a, const COleDateTime& b) {
+    return a < b && a != b;
+}
+
 bool IsLeapYear(int year);
 /// Days of a month, 1 to 12, of a year.
 int DaysInMonth(int year, int month);
