@@ -17,7 +17,8 @@
 /// Occurrences and indices count from 1. A null handle finds nothing in every lookup, and every add
 /// on one does nothing.
 ///
-/// Handles to parts of a tree are owned by the tree and valid until it is closed.
+/// Handles to parts of a tree are owned by the tree and valid until it is closed. A tree belongs to
+/// one thread at a time, also for lookups, which build indices on their first use.
 namespace ryn {
 
 class KvfTree;
@@ -30,7 +31,9 @@ struct KvfTreeDelete {
 };
 using KvfHandle = std::unique_ptr<KvfTree, KvfTreeDelete>;
 
-// Building. The tree has a cursor: each add goes to the innermost open target or section.
+// Building. The tree has a cursor: each add goes to the innermost open target or section, and each
+// parameter to the keyword that kvfAddKeyword started there last. With nothing open an add does
+// nothing. Names and texts may hold any bytes; they come back from a file unchanged.
 
 KvfHandle kvfCreate();
 /// Opens a target (closing what is still open) and returns it.
@@ -44,7 +47,8 @@ void kvfAddInt(KvfTree* tree, int value);
 void kvfAddFloat(KvfTree* tree, float value);
 void kvfAddDouble(KvfTree* tree, double value);
 void kvfAddBool(KvfTree* tree, bool value);
-/// Adds a keyword with this one parameter; repeated calls with one name add repeated keywords.
+/// Adds a whole keyword with this one parameter; repeated calls with one name add repeated
+/// keywords.
 void kvfPutParam(KvfTree* tree, std::string_view keyword, int value);
 void kvfPutParam(KvfTree* tree, std::string_view keyword, bool value);
 void kvfPutParam(KvfTree* tree, std::string_view keyword, float value);
@@ -57,16 +61,19 @@ void kvfPutParamFilename(KvfTree* tree, std::string_view keyword, std::string_vi
 void kvfPutListParam(KvfTree* tree, std::string_view keyword, std::string_view format,
                      std::initializer_list<int> values);
 
-/// Writes the tree as a new file, replacing what was there. The first failure since the last
-/// kvfTakeWriteError is kept for it.
+/// Writes the tree as a new file, replacing what was there. A tree beyond the format's limits (200
+/// levels, 256 MiB of text), which no load would take, is a failure. The first failure since the
+/// last kvfTakeWriteError is kept for it.
 Status kvfWrite(const KvfTree* tree, const std::string& path,
                 Durability durability = Durability::Flushed);
-/// Appends the tree's targets to an existing file, whole or not at all.
+/// Appends the tree's targets to an existing file, whole or not at all; a missing file is a
+/// failure. The old content is kept as it is and not looked into.
 Status kvfAppend(const KvfTree* tree, const std::string& path,
                  Durability durability = Durability::Flushed);
 /// The first write failure since the last call; Ok when there was none.
 Status kvfTakeWriteError();
-/// The tree as text, as kvfWrite puts it into a file.
+/// The tree as text, as kvfWrite puts it into a file. The same tree gives the same bytes. Not a
+/// number loses sign and payload; all else survives the text to the bit.
 std::string kvfText(const KvfTree* tree);
 /// Frees the tree and clears the handle.
 void kvfClose(KvfHandle* handle);
@@ -102,7 +109,7 @@ bool kvfGetBool(const KvfParam* param);
 
 /// Non-zero on success; zero, with `value` unchanged, when that occurrence or parameter does not
 /// exist or holds a type that does not widen to the one asked for without loss (int to float where
-/// exact, int and float to double).
+/// exact, int and float to double; a file name counts as text).
 int kvfGetParam(const KvfSection* parent, std::string_view keyword, int* value, int occurrence,
                 int index);
 int kvfGetParam(const KvfSection* parent, std::string_view keyword, bool* value, int occurrence,
@@ -120,7 +127,8 @@ int kvfGetParamFilename(const KvfSection* parent, std::string_view keyword, std:
 /// keyword does not exist, has fewer parameters, or one is no int.
 int kvfGetListParam(const KvfSection* parent, std::string_view keyword, int occurrence,
                     std::string_view format, std::initializer_list<int*> values);
-/// Copies the content of one target into another.
+/// Appends a copy of all that one target or section holds to another, of the same tree or of
+/// another one. The cursor stays where it is.
 void kvfCopy(const KvfSection* source, KvfSection* destination);
 
 // Walking a whole tree, for programs that show any file.
