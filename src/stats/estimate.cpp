@@ -1,0 +1,154 @@
+#include "stats/estimate.h"
+
+#include "stats/exponential_estimators.h"
+#include "stats/generalised_pareto_estimators.h"
+#include "stats/gev_estimators.h"
+
+#include <optional>
+
+namespace ryn::stats {
+
+namespace {
+
+constexpr FitFailure kNotAvailable{FitFault::NotAvailable};
+
+// Every estimator gives its own family; here they become one type.
+template <class D>
+Outcome<Estimate> AsEstimate(const Outcome<D>& fitted) {
+    if (!fitted) {
+        return fitted.Failure();
+    }
+    return Estimate{*fitted, {}};
+}
+
+// The rules that come before any estimation, in one place for all.
+std::optional<FitFailure> Refusal(const Combination& c, SeriesKind kind, std::size_t count) {
+    switch (OfferOf(c, kind)) {
+    case Offer::DistributionNotOffered:
+        return FitFailure{FitFault::DistributionNotOffered, {}, kind};
+    case Offer::MethodNotOffered:
+        return FitFailure{FitFault::MethodNotOffered};
+    case Offer::Offered:
+        break;
+    }
+    const std::size_t needed = MinimumCount(c, kind);
+    if (count < needed) {
+        return FitFailure{FitFault::TooFewValues,
+                          {static_cast<double>(count), static_cast<double>(needed)}};
+    }
+    return std::nullopt;
+}
+
+bool HasFixedLocation(const Combination& c, const SeriesFrame& frame) {
+    return EffectiveLocation(c, frame.kind) == LocationType::Fixed;
+}
+
+Outcome<Estimate> GumbelByMoments(const Combination& c, const CentralMoments& moments,
+                                  FitScratch& scratch) {
+    if (!c.sampleCorrection) {
+        return AsEstimate(GumbelFromMoments(moments));
+    }
+    if (scratch.gumbel.count != moments.count) {
+        scratch.gumbel = GumbelConstantsFor(moments.count);
+    }
+    return AsEstimate(GumbelFromMoments(moments, scratch.gumbel));
+}
+
+Outcome<Estimate> ByMoments(const Combination& c, const SeriesFrame& frame,
+                            const CentralMoments& moments, FitScratch& scratch) {
+    const bool fixed = HasFixedLocation(c, frame);
+    switch (c.distribution) {
+    case DistributionType::Gev:
+        return AsEstimate(GevFromMoments(moments));
+    case DistributionType::Gumbel:
+        return GumbelByMoments(c, moments, scratch);
+    case DistributionType::GeneralisedPareto:
+        return AsEstimate(fixed ? ParetoAboveFromMoments(frame.threshold, moments)
+                                : ParetoFromMoments(moments));
+    case DistributionType::Exponential:
+        return AsEstimate(fixed ? ExponentialAbove(frame.threshold, moments.mean)
+                                : ExponentialFromMoments(moments));
+    default:
+        return kNotAvailable;
+    }
+}
+
+Outcome<Estimate> ByLMoments(const Combination& c, const SeriesFrame& frame,
+                             const LMoments& moments) {
+    const bool fixed = HasFixedLocation(c, frame);
+    switch (c.distribution) {
+    case DistributionType::Gev:
+        return AsEstimate(GevFromLMoments(moments));
+    case DistributionType::Gumbel:
+        return AsEstimate(GumbelFromLMoments(moments));
+    case DistributionType::GeneralisedPareto:
+        return AsEstimate(fixed ? ParetoAboveFromLMoments(frame.threshold, moments)
+                                : ParetoFromLMoments(moments));
+    case DistributionType::Exponential:
+        return AsEstimate(fixed ? ExponentialAbove(frame.threshold, moments.l1)
+                                : ExponentialFromLMoments(moments));
+    default:
+        return kNotAvailable;
+    }
+}
+
+Outcome<Estimate> ByLikelihood(const Combination& c, const FitInput& input) {
+    switch (c.distribution) {
+    case DistributionType::Exponential:
+        return AsEstimate(
+            ExponentialAbove(input.frame.threshold, CentralMomentsOf(input.values).mean));
+    default:
+        return kNotAvailable;
+    }
+}
+
+LMoments LMomentsOfInput(const FitInput& input, FitScratch& scratch) {
+    if (input.order == ValueOrder::Ascending) {
+        return LMomentsOfSorted(input.values);
+    }
+    scratch.sorted.assign(input.values.begin(), input.values.end());
+    SortAscending(scratch.sorted);
+    return LMomentsOfSorted(scratch.sorted);
+}
+
+} // namespace
+
+Outcome<Estimate> EstimateParameters(const Combination& combination, const FitInput& input,
+                                     FitScratch& scratch) {
+    if (const auto refusal = Refusal(combination, input.frame.kind, input.values.size())) {
+        return *refusal;
+    }
+    switch (combination.method) {
+    case EstimationMethod::Moments:
+        return ByMoments(combination, input.frame, CentralMomentsOf(input.values), scratch);
+    case EstimationMethod::LMoments:
+        return ByLMoments(combination, input.frame, LMomentsOfInput(input, scratch));
+    case EstimationMethod::MaximumLikelihood:
+        break;
+    }
+    return ByLikelihood(combination, input);
+}
+
+Outcome<Estimate> EstimateFromMoments(const Combination& combination, const SeriesFrame& frame,
+                                      const CentralMoments& moments, FitScratch& scratch) {
+    if (const auto refusal = Refusal(combination, frame.kind, moments.count)) {
+        return *refusal;
+    }
+    if (combination.method != EstimationMethod::Moments) {
+        return FitFailure{FitFault::MethodNotOffered};
+    }
+    return ByMoments(combination, frame, moments, scratch);
+}
+
+Outcome<Estimate> EstimateFromLMoments(const Combination& combination, const SeriesFrame& frame,
+                                       const LMoments& moments) {
+    if (const auto refusal = Refusal(combination, frame.kind, moments.count)) {
+        return *refusal;
+    }
+    if (combination.method != EstimationMethod::LMoments) {
+        return FitFailure{FitFault::MethodNotOffered};
+    }
+    return ByLMoments(combination, frame, moments);
+}
+
+} // namespace ryn::stats

@@ -1,0 +1,25 @@
+#include "stats/exponential_estimators.h"
+
+#include "stats/checked.h"
+
+namespace ryn::stats {
+
+Outcome<Exponential> ExponentialAbove(double threshold, double meanOfValues) {
+    const double alpha = meanOfValues - threshold;
+    if (!(alpha > 0)) {
+        return FitFailure{FitFault::MeanExceedanceNotPositive};
+    }
+    return Checked(Exponential::Make({threshold, alpha}, LocationType::Fixed));
+}
+
+Outcome<Exponential> ExponentialFromMoments(const CentralMoments& moments) {
+    const double alpha = moments.StandardDeviation();
+    return Checked(Exponential::Make({moments.mean - alpha, alpha}));
+}
+
+Outcome<Exponential> ExponentialFromLMoments(const LMoments& moments) {
+    const double alpha = 2 * moments.l2;
+    return Checked(Exponential::Make({moments.l1 - alpha, alpha}));
+}
+
+} // namespace ryn::stats

@@ -1,0 +1,55 @@
+#include "stats/gev_estimators.h"
+
+#include "stats/checked.h"
+#include "stats/root.h"
+#include "stats/shape_functions.h"
+
+#include <cmath>
+#include <numbers>
+
+namespace ryn::stats {
+
+namespace {
+
+// Hosking, Wallis and Wood's approximation; its error in kappa is below 9e-4 for L-skewness
+// between -0.5 and 0.5.
+double ApproximateShape(double lSkewness) {
+    const double c = 2 / (3 + lSkewness) - std::numbers::ln2 / std::log(3.0);
+    return (7.8590 + 2.9554 * c) * c;
+}
+
+} // namespace
+
+Outcome<Gev> GevFromMoments(const CentralMoments& moments) {
+    const double skewness = moments.Skewness();
+    // The factor 1 + 3 kappa is positive and takes the pole at kappa = -1/3 out of the way of the
+    // interpolating solver.
+    const auto excess = [skewness](double kappa) {
+        return (1 + 3 * kappa) * (GevSkewness(kappa) - skewness);
+    };
+    const auto kappa = Root(excess, {-1.0 / 3 + 1e-9, 10});
+    if (!kappa) {
+        return SkewnessOutOfRange(skewness);
+    }
+    const double alpha = moments.StandardDeviation() / std::sqrt(GevVarianceFactor(*kappa));
+    const double xi = moments.mean - alpha * GevMeanFactor(*kappa);
+    return Checked(Gev::Make({xi, alpha, *kappa}));
+}
+
+Outcome<Gev> GevFromLMoments(const LMoments& moments) {
+    const double t3 = moments.LSkewness();
+    const FitFailure outside = LMomentsOutOfRange(moments.LCv(), t3);
+    if (!(t3 > -1 && t3 < 1)) {
+        return outside;
+    }
+    const auto excess = [t3](double kappa) { return GevLSkewness(kappa) - t3; };
+    const auto kappa = RootNear(excess, {-0.999999, 50}, ApproximateShape(t3), 1e-3);
+    if (!kappa) {
+        return outside;
+    }
+    const double alpha = moments.l2 / (std::tgamma(1 + *kappa) * GevLScaleFactor(*kappa));
+    const double xi = moments.l1 - alpha * GevMeanFactor(*kappa);
+    return Checked(Gev::Make({xi, alpha, *kappa}));
+}
+
+} // namespace ryn::stats

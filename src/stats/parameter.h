@@ -1,0 +1,37 @@
+#pragma once
+
+#include "stats/fixed_list.h"
+
+#include <string_view>
+
+namespace ryn::stats {
+
+/// Whether the location of a distribution is known beforehand (0, or the threshold of a partial
+/// duration series) or estimated from the sample. The numbers are those of the setup file.
+enum class LocationType { Fixed = 0, Estimated = 1 };
+
+/// One parameter of a distribution.
+struct Parameter {
+    std::string_view symbol; ///< ASCII word: xi, alpha, kappa, mu, sigma, a or b
+    double value = 0;
+    bool estimated = true; ///< false for a location that was given
+};
+
+/// All parameters of a distribution, in the order in which results list them.
+using ParameterList = FixedList<Parameter, 3>;
+using SymbolList = FixedList<std::string_view, 3>;
+
+/// Values of a location and scale family, in the unit of the series.
+struct LocationScale {
+    double xi = 0;    ///< location; finite
+    double alpha = 1; ///< scale; finite, > 0
+};
+
+/// Values of a family with one shape parameter.
+struct LocationScaleShape {
+    double xi = 0;    ///< location; finite
+    double alpha = 1; ///< scale; finite, > 0 (Pearson 3 and log-Pearson 3: not 0)
+    double kappa = 0; ///< shape, without unit; its sign and range are the family's
+};
+
+} // namespace ryn::stats
