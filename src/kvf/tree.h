@@ -6,10 +6,10 @@
 #include <deque>
 #include <functional>
 #include <memory>
+#include <set>
 #include <string>
 #include <string_view>
 #include <unordered_map>
-#include <unordered_set>
 #include <variant>
 #include <vector>
 
@@ -107,13 +107,10 @@ class KvfTree {
     KvfKeyword* openKeyword = nullptr;
 
   private:
-    struct NameHash : std::hash<std::string_view> {
-        using is_transparent = void;
-    };
-
     const std::string* Intern(std::string_view name);
 
-    std::unordered_set<std::string, NameHash, std::equal_to<>> names;
+    // Ordered and not hashed: a hostile file could choose names of one hash.
+    std::set<std::string, std::less<>> names;
     std::deque<KvfSection> sections;
     std::deque<KvfKeyword> keywords;
     std::deque<KvfParam> params;

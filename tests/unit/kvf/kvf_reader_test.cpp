@@ -202,7 +202,8 @@ TEST(KvfReader, RefusesTooManyLevelsAndReadsTheLastOneAllowed) {
 }
 
 TEST(KvfReader, ReadsOrRefusesAVeryLongLine) {
-    const std::string junk(20'000'000, 'x');
+    std::string junk;
+    junk.resize(20'000'000, 'x');
     const KvfHandle tree = kvfLoadText("A { K = \"" + junk + "\" }", "long.ryn");
     std::string value;
     EXPECT_NE(kvfGetParam(kvfTargetByNameNum(tree.get(), "A", 1), "K", &value, 1, 1), 0);
