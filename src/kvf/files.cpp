@@ -65,17 +65,17 @@ Status ReadText(const std::string& path, std::string* text) {
     return ReadWholeFile(path, kKvfMaxFileSize, text); // which knows the other reasons
 }
 
-/// The text of a tree that a load would take.
-Status TextFor(const KvfTree* tree, const std::string& path, std::string* text) {
+/// Appends a tree's text, which has to be one that a load takes.
+Status AppendText(const KvfTree* tree, const std::string& path, std::string* text) {
     if (tree == nullptr)
         return Status::SystemFault(path + ": there is nothing to write");
-    KvfTextWriter writer;
+    KvfTextWriter writer(std::move(*text));
     kvfVisit(tree, writer);
+    *text = writer.TakeText();
     if (writer.Depth() > kKvfMaxDepth)
         return Status::SystemFault(path + ": " + std::to_string(writer.Depth()) +
                                    " levels of blocks are more than the format's " +
                                    std::to_string(kKvfMaxDepth));
-    *text += writer.Text();
     if (text->size() > kKvfMaxFileSize)
         return Status::SystemFault(path + ": the file would be larger than " + kSizeLimitText);
     return Status::Ok();
@@ -91,7 +91,7 @@ Status Save(const KvfTree* tree, const std::string& path, WriteMode mode, Durabi
         if (!text.empty() && text.back() != '\n')
             text += '\n';
     }
-    if (Status status = TextFor(tree, path, &text); !status)
+    if (Status status = AppendText(tree, path, &text); !status)
         return status;
     return WriteFileAtomically(path, text, durability);
 }

@@ -133,7 +133,7 @@ void KvfTextWriter::Indent(std::size_t level) {
 std::string kvfText(const KvfTree* tree) {
     KvfTextWriter writer;
     kvfVisit(tree, writer);
-    return writer.Text();
+    return writer.TakeText();
 }
 
 } // namespace ryn

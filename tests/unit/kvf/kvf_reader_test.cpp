@@ -89,8 +89,8 @@ TEST(KvfReader, TakesAnyLayoutThatTheGrammarAllows) {
     const char* const texts[] = {
         "A {\n    K =\n    L = 1, 2\n    \"\\\"b c\" {\n    }\n}\nA {\n}\n",
         "A{K=#c\nL=1,2\n\"\\\"b c\"{}}A{}",
-        "\xEF\xBB\xBF# caf\xC3\xA9\r\nA {\r\n\tK = \r\n\tL = 1, # one\r\n\r\n# two\r\n2\r\n"
-        "\"\\x22b c\" { } } A\t{ } # end",
+        ("\xEF\xBB\xBF# caf\xC3\xA9\r\nA {\r\n\tK = \r\n\tL = 1, # one\r\n\r\n# two\r\n2\r\n"
+         "\"\\x22b c\" { } } A\t{ } # end"),
     };
     for (const char* text : texts) {
         const KvfHandle tree = kvfLoadText(text, "case.ryn");
