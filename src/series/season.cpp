@@ -12,7 +12,7 @@ COleDateTime MonthDay::MidnightIn(int year) const {
     if (year < 100)
         return {100, 1, 1, 0, 0, 0};
     if (year > 9999)
-        return {9999, 12, 31, 23, 59, 59};
+        return COleDateTime(2958465.9999999); // some 10 ms before the end of 9999
     const MonthDay real = In(year);
     return {year, real.month, real.day, 0, 0, 0};
 }
