@@ -1,17 +1,22 @@
 #pragma once
 
+#include <cstddef>
 #include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "base/status.h"
 
 /// The store of one-dimensional data files (.tsq0, .tq0): a time axis and one or more items with a
 /// value for each time step. docs/formats/tsq.md describes the file, which is netCDF with CF
 /// conventions. Operations return 0 on success and another value on failure unless told otherwise;
-/// the reason of the last failure is tsqLastError. A null handle fails.
+/// the reason of the last failure is told by tsqTakeError. A null handle fails.
 ///
-/// Reading and writing go step by step, and behind them the store works in blocks.
+/// Reading and writing go step by step, and behind them the store works in blocks. Times of steps
+/// count from the axis's start, which lies `start` behind the axis's date; a relative axis has
+/// 1900-01-01 00:00:00 for its date. Different files may be used in different threads at the same
+/// time; the last failure and the error handler are each thread's own.
 namespace ryn {
 
 struct TsqHeader;
@@ -41,8 +46,16 @@ enum TsqAxisType : int {
 
 /// Opens a file of ours or any netCDF file with items along one time axis. On failure both handles
 /// stay null. Refused with a reason: no netCDF, no time axis, counts that disagree with the file,
-/// more than 2^31 - 1 steps.
+/// more than 2^31 - 1 steps, and in a file of another program steps that do not ascend.
+///
+/// Another program's file has a non-equidistant axis in seconds from the second of its first step
+/// (a calendar axis, or a relative one where its time unit names no date); its items are the
+/// numeric variables along the time axis in file order, unpacked.
 int tsqFileRead(const std::string& path, TsqHeaderHandle* header, TsqFileHandle* file);
+/// The same, and takes steps in any order, also equal ones: for who sorts them.
+int tsqFileReadUnordered(const std::string& path, TsqHeaderHandle* header, TsqFileHandle* file);
+/// True when a data file of this name exists in memory, or on disk and can be opened for reading.
+bool tsqFileExists(const std::string& path);
 /// 0 for a header without an axis.
 int tsqGetTimeAxisType(const TsqHeader* header);
 // Axis operations: each answers for its own axis type and fails, outputs unchanged, for another.
@@ -67,18 +80,23 @@ int tsqGetItemInfo(const TsqItem* item, int* type, std::string* typeText, std::s
                    int* unit, std::string* unitText, int* dataType);
 /// Number of spatial dimensions of an item: 0 for a plain series.
 int tsqGetItemDimensions(const TsqItem* item);
+/// Number of values of an item in a time step: 1 for a plain series; 0 for a null item.
+std::size_t tsqGetItemSize(const TsqItem* item);
 std::string tsqGetFileTitle(const TsqHeader* header);
-/// The file's delete value.
+/// The file's delete value; of another program's file what its first item marks missing values
+/// with.
 float tsqGetDeleteValFloat(const TsqHeader* header);
 /// Counts the values of an item that are marked missing or not finite, in a file that another
 /// program made (fill value, missing value, NaN); always 0 in a file of ours, whose delete value is
-/// an ordinary value to this system.
+/// an ordinary value to this system. The place in the file does not move.
 int tsqCountMissing(TsqHeader* header, TsqFile* file, int itemNumber, int* missing);
 /// Places the file at the first time step.
 int tsqFindBlockDynamic(TsqHeader* header, TsqFile* file);
 /// Reads the next item of the current time step, in item order, and the time of the step in the
-/// axis's unit. A value that another program marked as missing comes as NaN. A null buffer passes over the item without reading it; a null time likewise. An
-/// item with spatial dimensions fills so many values.
+/// axis's unit. A value that another program marked as missing comes as NaN. A null buffer passes
+/// over the item without reading it; a null time likewise. An item with spatial dimensions fills
+/// tsqGetItemSize values. What tsqCountMissing counts reads as NaN. On failure, behind the last
+/// step too, nothing moves.
 int tsqReadItemTimeStep(TsqHeader* header, TsqFile* file, double* time, float* buffer);
 
 // Writing.
@@ -86,6 +104,7 @@ int tsqReadItemTimeStep(TsqHeader* header, TsqFile* file, double* time, float* b
 int tsqHeaderCreate(int fileType, const std::string& title, const std::string& applicationName,
                     int applicationVersion, int numberOfItems, int statisticsKind,
                     TsqHeaderHandle* header);
+// Axes: months and years are no units of a calendar axis; a step is above 0; dates are valid.
 int tsqSetAppTitle(TsqHeader* header, const std::string& text);
 int tsqSetDeleteValFloat(TsqHeader* header, float value);
 int tsqSetDeleteValDouble(TsqHeader* header, double value);
@@ -109,19 +128,40 @@ int tsqSetItemAxisEqD0(TsqItem* item, int unit);
 /// Two equidistant spatial axes.
 int tsqSetItemAxisEqD2(TsqItem* item, int unit, int sizeX, int sizeY, float originX, float originY,
                        float stepX, float stepY);
+/// Where the cells of a grid really lie, for grids that are run by index.
+struct TsqGridCoordinates {
+    struct Axis {
+        std::string name;           ///< of the coordinate variable; empty for the usual one
+        std::string units;          ///< as in the grid's own file
+        std::string standardName;   ///< of CF; may be empty
+        std::vector<double> values; ///< empty: from the item's origin and step
+    };
+    Axis x;
+    Axis y;
+    /// Degrees of each cell, x fast; both empty for a grid that its two axes describe.
+    std::vector<double> longitudes;
+    std::vector<double> latitudes;
+};
+/// Coordinates of every item with two spatial axes, whose sizes they must have (tsqFileCreate
+/// fails otherwise). Without this call they follow from origin and step.
+int tsqSetGridCoordinates(TsqHeader* header, const TsqGridCoordinates& coordinates);
 /// Makes the file: it takes its name when it is closed, so that an old file stands until then.
 int tsqFileCreate(const std::string& path, TsqHeader* header, TsqFileHandle* file);
 /// Appends the next item of the current time step. The time counts with the first item of a step
-/// and is stored rounded to the millisecond; it must be finite.
+/// and is stored rounded to the millisecond; it must be finite. On an equidistant axis it is
+/// ignored: there the axis tells it. An item with two spatial axes takes a whole plane, x fast; a
+/// NaN in it becomes the delete value. After a failure the file cannot be completed any more.
 int tsqWriteItemTimeStep(TsqHeader* header, TsqFile* file, double time, const float* values);
 
-/// Closes; a file being written is completed and takes its name here. A null file is no error.
+/// Closes; a file being written is completed, flushed to the disk, and takes its name here. On
+/// failure an old file of that name stays as it was. A null file is no error.
 int tsqFileClose(TsqHeader* header, TsqFileHandle* file);
 void tsqHeaderDestroy(TsqHeaderHandle* header);
 
 // Errors.
 
-/// Why the last operation that failed did so; names the file. Ok when none did since the last call.
+/// Why the last operation of this thread that failed did so; names the file. Ok when none did since
+/// the last call.
 Status tsqTakeError();
 
 /// Gets an error's type, the library's source file and its line; returns 0.
@@ -130,8 +170,10 @@ using TsqErrorHandler = std::function<int(int type, const char* sourceFile, int 
 /// empty one removes it. Returns the handler that was installed before.
 TsqErrorHandler tsqAddCommonErrorHandler(TsqErrorHandler handler);
 
-/// While an object lives, every data file whose absolute path lies in its directory exists in
-/// memory alone, under the same operations: nothing reaches the disk.
+/// While an object lives, every data file whose absolute path lies directly in its directory exists
+/// in memory alone, under the same operations: nothing reaches the disk, and the directory itself
+/// need not exist there. A file being read stays readable when it is removed or replaced, and when
+/// the object is gone.
 class TsqMemoryDirectory {
   public:
     explicit TsqMemoryDirectory(const std::string& directory);
@@ -148,7 +190,8 @@ class TsqMemoryDirectory {
     std::string directory;
 };
 
-/// Copies a data file, from memory to disk too.
+/// Copies a data file; between disk and memory too. A copy to disk replaces an old file whole, and
+/// is not flushed.
 Status tsqCopyFile(const std::string& from, const std::string& to);
 
 } // namespace ryn

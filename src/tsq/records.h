@@ -1,0 +1,89 @@
+#pragma once
+
+#include <array>
+#include <cstddef>
+#include <string>
+#include <vector>
+
+#include "tsq/tsq.h"
+#include "units/units.h"
+
+namespace ryn {
+
+struct TsqAxis {
+    int type = 0; ///< TsqAxisType; 0 before one is set
+    int unit = kUnitSecond;
+    std::string date; ///< of a calendar axis, "YYYY-MM-DD"
+    std::string time; ///< "HH:MM:SS"
+    double start = 0.0;
+    double step = 0.0; ///< of an equidistant axis
+    double span = 0.0; ///< time of the last step
+    int count = 0;
+    int index = 0;
+
+    bool IsEquidistant() const { return type == kTsqEqTimeAxis || type == kTsqEqCalendarAxis; }
+    bool IsCalendar() const { return type == kTsqEqCalendarAxis || type == kTsqNeqCalendarAxis; }
+};
+
+/// Two equidistant spatial axes; no values where an item has none.
+struct TsqPlane {
+    int unit = kUnitUndefined;
+    int sizeX = 0;
+    int sizeY = 0;
+    float originX = 0.0F;
+    float originY = 0.0F;
+    float stepX = 0.0F;
+    float stepY = 0.0F;
+
+    friend bool operator==(const TsqPlane&, const TsqPlane&) = default;
+};
+
+struct TsqItem {
+    int type = kItemTypeUndefined;
+    std::string name;
+    int unit = kUnitUndefined;
+    int dataType = kTsqDataTypeFloat;
+    int valueType = 0;
+    std::array<float, 3> reference{};
+    std::array<float, 3> orientation{};
+    int dimensions = 0;    ///< number of spatial ones
+    TsqPlane plane;        ///< of an item that is written with two
+    std::size_t cells = 1; ///< values in a time step
+};
+
+struct TsqProjection {
+    std::string text;
+    double longitude = 0.0;
+    double latitude = 0.0;
+    double rotation = 0.0;
+};
+
+struct TsqHeader {
+    int fileType = 0;
+    int statisticsKind = 0;
+    std::string title;
+    std::string applicationName;
+    std::string applicationTitle;
+    int applicationVersion = 0;
+    int dataType = 0;
+    float deleteFloat = 0.0F;
+    double deleteDouble = 0.0;
+    TsqProjection projection;
+    TsqAxis axis;
+    TsqGridCoordinates coordinates;
+    std::vector<TsqItem> items; ///< keeps its size, so that item handles stay
+};
+
+/// A whole data file. Equidistant axes keep no times.
+struct TsqContent {
+    TsqHeader header;
+    std::vector<double> times;
+    std::vector<std::vector<float>> values; ///< of each item, step by step
+};
+
+/// Milliseconds in a time unit; 0 for a unit that is none.
+double MillisecondsInUnit(int unit);
+/// A time in a unit, rounded to the millisecond.
+double RoundedToMillisecond(double time, double millisecondsInUnit);
+
+} // namespace ryn
