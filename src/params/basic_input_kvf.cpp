@@ -40,7 +40,9 @@ int CBasicInputKvf::CheckPartialDurations(CMessageList& messages) const {
         add(kTextInterTimeNotNegative);
     if (InterLevelSpecified && !(InterLevel >= 0.0 && InterLevel <= 1.0))
         add(kTextInterLevelFraction);
-    if (byThreshold && !InputFileName.empty() && InputItem != 0 &&
+    // A summary that was never filled has no maximum to compare with.
+    const bool summarised = summary.maximum.value != -CTsqValues::kHighestValue;
+    if (byThreshold && !InputFileName.empty() && InputItem != 0 && summarised &&
         Threshold > summary.maximum.value)
         messages.push_back({kPage, FormatText(kTextThresholdBelowMaximum, summary.maximum.value)});
     return static_cast<int>(messages.size() - before);

@@ -206,7 +206,8 @@ TEST(ParameterFile, WithoutItsTargetLeavesTheDefaults) {
 
 std::vector<std::string> FindingsOf(CKvfBase& section, int page) {
     CMessageList messages;
-    EXPECT_EQ(static_cast<std::size_t>(section.Check(messages, 1)), messages.size());
+    const int found = section.Check(messages, 1);
+    EXPECT_EQ(static_cast<std::size_t>(found), messages.size());
     std::vector<std::string> texts;
     for (const CMessage& message : messages) {
         EXPECT_EQ(message.page, page);

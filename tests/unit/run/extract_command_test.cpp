@@ -65,6 +65,7 @@ TEST(ExtractCommand, KeepsTheOldSeriesWhenTheInputIsBad) {
     run.root.BasicInput().InputItem = 1;
     run.root.BasicInput().AmsStartDate = COleDateTime();
     EXPECT_EQ(run.Run().messageId, kTextInvalidYearStart);
+    run.root.BasicInput().AmsStartDate = COleDateTime(1990, 1, 1, 0, 0, 0);
     run.root.BasicInput().InputFileName = run.directory.Write("bad.tsq0", "CDF\1 no more");
     EXPECT_THAT(run.Run().status.Text(), HasSubstr("bad.tsq0"));
     EXPECT_EQ(run.directory.Read("out.tsq0"), "old");

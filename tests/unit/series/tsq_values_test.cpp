@@ -34,8 +34,9 @@ class DataFile {
     }
     TsqHeader* Header() { return header.get(); }
     void Step(double time, const std::vector<float>& values) {
-        if (!file)
+        if (!file) {
             ASSERT_EQ(tsqFileCreate(path, header.get(), &file), 0);
+        }
         for (const float value : values)
             ASSERT_EQ(tsqWriteItemTimeStep(header.get(), file.get(), time, &value), 0);
     }
