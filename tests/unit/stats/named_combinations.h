@@ -1,0 +1,67 @@
+#pragma once
+
+#include "stats/combination.h"
+#include "stats/estimate.h"
+#include "unit/stats/reference_files.h"
+
+#include <map>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+namespace ryn::stats::testing {
+
+/// The combination that results show under `name`, as "GP2/LMOM".
+inline Combination Named(const std::string& name) {
+    struct Code {
+        DistributionType distribution;
+        LocationType location;
+    };
+    using enum DistributionType;
+    static const std::map<std::string, Code> codes = {
+        {"GEV", {Gev, LocationType::Fixed}},
+        {"GUM", {DistributionType::Gumbel, LocationType::Fixed}},
+        {"WEI", {Weibull, LocationType::Fixed}},
+        {"WEI2", {Weibull, LocationType::Fixed}},
+        {"WEI3", {Weibull, LocationType::Estimated}},
+        {"FRE", {Frechet, LocationType::Fixed}},
+        {"GP", {DistributionType::GeneralisedPareto, LocationType::Fixed}},
+        {"GP2", {DistributionType::GeneralisedPareto, LocationType::Fixed}},
+        {"GP3", {DistributionType::GeneralisedPareto, LocationType::Estimated}},
+        {"P3", {GammaPearson3, LocationType::Estimated}},
+        {"GAM", {GammaPearson3, LocationType::Fixed}},
+        {"LP3", {LogPearson3, LocationType::Fixed}},
+        {"LN2", {LogNormal, LocationType::Fixed}},
+        {"LN3", {LogNormal, LocationType::Estimated}},
+        {"EXP1", {DistributionType::Exponential, LocationType::Fixed}},
+        {"EXP2", {DistributionType::Exponential, LocationType::Estimated}},
+        {"SQE", {SquareRootExponential, LocationType::Fixed}},
+        {"TGUM", {TruncatedGumbel, LocationType::Fixed}},
+    };
+    static const std::map<std::string, EstimationMethod> methods = {
+        {"MOM", EstimationMethod::Moments},
+        {"ML", EstimationMethod::MaximumLikelihood},
+        {"LMOM", EstimationMethod::LMoments}};
+    const auto slash = name.find('/');
+    const Code code = codes.at(name.substr(0, slash));
+    const auto end = name.find_first_of(" /", slash + 1);
+    Combination combination;
+    combination.distribution = code.distribution;
+    combination.location = code.location;
+    combination.method = methods.at(name.substr(slash + 1, end - slash - 1));
+    combination.sampleCorrection = name.ends_with(" corr");
+    return combination;
+}
+
+/// How the reference series came from their records.
+inline SeriesFrame FrameOf(const std::string& series) {
+    if (series == "rain40") {
+        return {SeriesKind::PartialDuration, 40, 44.0 / 48};
+    }
+    if (series == "rain30") {
+        return {SeriesKind::PartialDuration, 30, 152.0 / 48};
+    }
+    return {};
+}
+
+} // namespace ryn::stats::testing
