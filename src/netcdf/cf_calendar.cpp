@@ -112,12 +112,15 @@ Int NewYear(Int year) {
     return GregorianDay({year, 1, 1});
 }
 
-/// A day of a year of 360, at the same fraction of the real one.
+/// A day of a year of 360, at the same fraction of the real one: the nearest day, the even one of
+/// two equally near, as the field's converters round.
 Int RealDayOf360(Int number) {
     const Int year = FloorDivide(number, 360);
-    const Int dayOfYear = number - year * 360 + 1;
-    const Int daysInYear = IsGregorianLeap(year) ? 366 : 365;
-    return NewYear(year) + (2 * dayOfYear * daysInYear + 360) / 720 - 1; // to the nearest day
+    const Int scaled = (number - year * 360 + 1) * (IsGregorianLeap(year) ? 366 : 365);
+    const Int below = scaled / 360;
+    const Int rest = scaled % 360;
+    const bool goesUp = rest > 180 || (rest == 180 && below % 2 != 0);
+    return NewYear(year) + below + (goesUp ? 1 : 0) - 1;
 }
 
 Int RealMillisecondsOfAllLeap(Int milliseconds) {

@@ -41,7 +41,7 @@ inline constexpr std::int64_t kMillisecondsPerDay = 86400000;
 /// 1970-01-01 00:00:00 of the proleptic Gregorian calendar:
 ///  - calendars of the real world: the same moment;
 ///  - no leap days: the same date and time of day;
-///  - 360 days: the day at the same fraction of the real year, at the same time of day;
+///  - 360 days: the day nearest to the same fraction of the real year, at the same time of day;
 ///  - all leap days: the same date and time in a leap year, the same fraction of a common year.
 /// Later moments stay later.
 std::int64_t RealMilliseconds(CfCalendar calendar, std::int64_t milliseconds);

@@ -23,7 +23,8 @@ class NcValues {
     Status Read(std::span<const std::size_t> start, std::span<const std::size_t> count,
                 float* values);
     /// What stands for a missing value, as it stands in the file, the default fill included.
-    std::span<const double> MissingMarks() const { return marks; }
+    std::span<const double> MissingMarks() const& { return marks; }
+    std::span<const double> MissingMarks() const&& = delete;
     /// True when the values are floats that stand in the file as they are and none is marked.
     bool IsPlain() const { return isPlain; }
 

@@ -288,7 +288,8 @@ class Opener {
     void SetForeignDeleteValue() {
         if (isMarked)
             return;
-        const auto marks = NcValues(file.get(), columns.front().variable).MissingMarks();
+        const NcValues values(file.get(), columns.front().variable);
+        const auto marks = values.MissingMarks();
         const auto isFloat = [](double mark) {
             return std::abs(mark) <= static_cast<double>(std::numeric_limits<float>::max());
         };

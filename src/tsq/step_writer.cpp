@@ -14,6 +14,8 @@ namespace ryn {
 
 Status StepWriter::Create(const std::string& path, const TsqHeader& header,
                           std::unique_ptr<StepWriter>* writer) {
+    if (path.empty())
+        return Status::SystemFault("no file name");
     if (header.axis.type == 0)
         return Status::InputFault(path + ": the data file has no time axis");
     if (Status status = CheckCoordinates(path, header); !status)
