@@ -16,10 +16,12 @@ Outcome<D> Checked(const std::optional<D>& made) {
     return FitFailure{FitFault::InvalidParameters};
 }
 
+/// Failure C06 with its number.
 inline FitFailure SkewnessOutOfRange(double skewness) {
     return {FitFault::SkewnessOutOfRange, {skewness, 0}};
 }
 
+/// Failure C08 with its numbers: L-Cv and L-skewness of the sample.
 inline FitFailure LMomentsOutOfRange(double lCv, double lSkewness) {
     return {FitFault::LMomentsOutOfRange, {lCv, lSkewness}};
 }

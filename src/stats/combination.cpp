@@ -7,6 +7,7 @@ namespace ryn::stats {
 
 namespace {
 
+// The methods that a distribution has in one kind of series; with none it is not offered at all.
 struct Methods {
     bool moments;
     bool likelihood;
@@ -44,6 +45,7 @@ constexpr SymbolList kLocationScale{"xi", "alpha"};
 constexpr SymbolList kLocationScaleShape{"xi", "alpha", "kappa"};
 constexpr SymbolList kScaleShape{"alpha", "kappa"};
 
+// What the dialogs offer, so that a file from elsewhere can ask for no more than they do.
 constexpr std::array<Row, 11> kRows = {{
     {DistributionType::Gev, kAll, kNone, kLocationScaleShape, kLocationScaleShape},
     {DistributionType::Gumbel, kAll, kNone, kLocationScale, kLocationScale},
@@ -66,6 +68,8 @@ const Row* FindRow(DistributionType distribution) {
     return found == kRows.end() ? nullptr : found;
 }
 
+// The L-moments of the log-normal are solved for two parameters only, and its likelihood has a
+// useful maximum in three, so that the log-normal goes the other way than the rest.
 LocationType LogNormalLocation(const Combination& combination) {
     return combination.method == EstimationMethod::LMoments ? LocationType::Fixed
                                                             : combination.location;
@@ -104,9 +108,12 @@ LocationType EffectiveLocation(const Combination& combination, SeriesKind kind) 
     case DistributionType::Exponential:
         break;
     }
+    // Annual maxima have no threshold that could serve as location.
     if (kind == SeriesKind::AnnualMaximum) {
         return LocationType::Estimated;
     }
+    // The likelihood of a family with a free lower bound grows without limit towards the smallest
+    // value for many shapes.
     return combination.method == EstimationMethod::MaximumLikelihood ? LocationType::Fixed
                                                                      : combination.location;
 }

@@ -21,12 +21,16 @@ enum class DistributionType {
     TruncatedGumbel = 10,
 };
 
+/// How parameters are found; the numbers are those of the setup file.
 enum class EstimationMethod { Moments = 0, MaximumLikelihood = 1, LMoments = 2 };
 
-/// Where the moments of a log-Pearson 3 distribution are taken.
+/// Where the moments of a log-Pearson 3 distribution are taken (log space: Bulletin 17B, IACWD
+/// 1982; real space: Bobee 1975); the numbers are those of the setup file.
 enum class LogPearsonType { LogSpace = 0, RealSpace = 1 };
 
-/// How the lower bound of a three-parameter log-normal distribution is found by moments.
+/// How the lower bound of a three-parameter log-normal distribution is found by moments: from the
+/// sample skewness corrected for bias (I: Fisher's G1; II: Bobee and Robitaille 1975), or from
+/// order statistics (I: Iwai; II: Stedinger 1980). The numbers are those of the setup file.
 enum class LogNormalType {
     SkewnessCorrectionI = 0,
     SkewnessCorrectionII = 1,

@@ -43,6 +43,7 @@ bool HasFixedLocation(const Combination& c, const SeriesFrame& frame) {
     return EffectiveLocation(c, frame.kind) == LocationType::Fixed;
 }
 
+// The constants cost two logarithms a value and change with the sample size alone.
 Outcome<Estimate> GumbelByMoments(const Combination& c, const CentralMoments& moments,
                                   FitScratch& scratch) {
     if (!c.sampleCorrection) {
@@ -102,6 +103,7 @@ Outcome<Estimate> ByLikelihood(const Combination& c, const FitInput& input) {
     }
 }
 
+// The buffer keeps its memory between calls, so that only the first of many refits allocates.
 LMoments LMomentsOfInput(const FitInput& input, FitScratch& scratch) {
     if (input.order == ValueOrder::Ascending) {
         return LMomentsOfSorted(input.values);

@@ -24,6 +24,7 @@ double Exponential::LogDensityInside(double x) const {
     return -logAlpha - StandardVariate(x);
 }
 
+// Just above xi, F is z to the last digit, where 1 - exp(-z) would have lost most of them.
 double Exponential::CdfInside(double x) const {
     return -std::expm1(-StandardVariate(x));
 }
@@ -32,6 +33,7 @@ double Exponential::SurvivalInside(double x) const {
     return std::exp(-StandardVariate(x));
 }
 
+// z is -ln e: of a given exceedance, or as log1p(-F) where F is small and e close to 1.
 double Exponential::QuantileInside(double probability) const {
     return p.xi - p.alpha * std::log1p(-probability);
 }

@@ -19,12 +19,15 @@ class Exponential {
     static std::optional<Exponential> Make(const LocationScale& values,
                                            LocationType location = LocationType::Estimated);
 
+    /// The parameters as they were given to Make.
     const LocationScale& Values() const { return p; }
 
     Interval Support() const;
+    /// With x finite and in Support().
     double LogDensityInside(double x) const;
     double CdfInside(double x) const;
     double SurvivalInside(double x) const;
+    /// With the probability strictly between 0 and 1.
     double QuantileInside(double probability) const;
     double QuantileOfExceedanceInside(double exceedance) const;
     /// z, which is -ln(1 - F); negative below xi.
@@ -32,6 +35,7 @@ class Exponential {
     double ReducedVariateOfProbability(double probability) const;
     /// z.
     double StandardVariate(double x) const;
+    /// In the order in which results list them.
     ParameterList Parameters() const;
 
   private:

@@ -21,6 +21,8 @@ double LowestPeak(const SeriesFrame& frame) {
                : std::numeric_limits<double>::infinity();
 }
 
+// One visit for the whole sample. The support is asked once and the formula inside it directly; the
+// guarded LogDensity would ask it again for each value.
 template <Family D>
 Agreement Compare(const D& d, const FitInput& input) {
     const Interval support = d.Support();

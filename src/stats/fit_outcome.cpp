@@ -7,6 +7,7 @@ namespace ryn::stats {
 
 namespace {
 
+// to_chars knows no locale: the log has a decimal point everywhere.
 std::string ThreeDecimals(double value) {
     // The largest double has 309 digits before the point.
     std::array<char, 320> buffer{};

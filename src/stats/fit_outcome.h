@@ -49,17 +49,20 @@ std::string FailureCode(const FitFailure& failure);
 /// One line for the log, without code and full stop. Numbers have a decimal point in any locale.
 std::string FailureText(const FitFailure& failure);
 
+/// What a fit is to be read with, though it stands. The numbers are those of the log's W1 to W3.
 enum class FitWarningKind {
     ValuesOutsideSupport = 1,    ///< W1
     SkewnessCorrectionRange = 2, ///< W2
     ReducedToExponential = 3,    ///< W3
 };
 
+/// A warning as a value; its text is made when somebody asks for it.
 struct FitWarning {
     FitWarningKind kind = FitWarningKind::ValuesOutsideSupport;
     std::size_t count = 0; ///< ValuesOutsideSupport: number of values
 };
 
+/// Each warning at most once.
 using WarningList = FixedList<FitWarning, 3>;
 
 /// "W1" to "W3".

@@ -8,6 +8,7 @@ namespace ryn::stats {
 
 namespace {
 
+// 1 - kappa z must not be negative: only kappa > 0 sets an upper bound, at z = 1/kappa.
 Interval SupportOf(const LocationScaleShape& p) {
     Interval support;
     support.lower = p.xi;
@@ -33,6 +34,8 @@ GeneralisedPareto::GeneralisedPareto(const LocationScaleShape& values, LocationT
       logAlpha(std::log(values.alpha)),
       support(SupportOf(values)) {}
 
+// With y = -ln(1 - kappa z)/kappa the survival function is exp(-y), and dy/dx = exp(kappa y)/alpha.
+// So ln f = -y + ln(dy/dx) = -ln alpha - (1 - kappa) y.
 double GeneralisedPareto::LogDensityInside(double x) const {
     return -logAlpha - DensitySlopeTerm(ReducedVariate(x), p.kappa);
 }
@@ -45,6 +48,7 @@ double GeneralisedPareto::SurvivalInside(double x) const {
     return std::exp(-ReducedVariate(x));
 }
 
+// y is -ln e: of a given exceedance, or as log1p(-F) where F is small and e close to 1.
 double GeneralisedPareto::QuantileInside(double probability) const {
     return p.xi + p.alpha * StandardOfReduced(-std::log1p(-probability), p.kappa);
 }

@@ -20,13 +20,15 @@ class GeneralisedPareto {
     static std::optional<GeneralisedPareto> Make(const LocationScaleShape& values,
                                                  LocationType location = LocationType::Estimated);
 
+    /// The parameters as they were given to Make.
     const LocationScaleShape& Values() const { return p; }
 
     Interval Support() const { return support; }
-    /// Plus infinity at the upper end for kappa > 1.
+    /// With x finite and in Support(); plus infinity at the upper end for kappa > 1.
     double LogDensityInside(double x) const;
     double CdfInside(double x) const;
     double SurvivalInside(double x) const;
+    /// With the probability strictly between 0 and 1.
     double QuantileInside(double probability) const;
     double QuantileOfExceedanceInside(double exceedance) const;
     /// y = -ln(1 - kappa z)/kappa, which is -ln(1 - F); negative below xi.
@@ -34,6 +36,7 @@ class GeneralisedPareto {
     double ReducedVariateOfProbability(double probability) const;
     /// z.
     double StandardVariate(double x) const;
+    /// In the order in which results list them.
     ParameterList Parameters() const;
 
   private:

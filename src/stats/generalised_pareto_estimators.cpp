@@ -7,6 +7,9 @@
 
 namespace ryn::stats {
 
+// A Pareto has mean xi + alpha/(1+k), variance alpha^2/((1+k)^2 (1+2k)) and the skewness below,
+// which falls from infinity at k = -1/3: the skewness gives k, then the variance alpha, then the
+// mean xi.
 Outcome<GeneralisedPareto> ParetoFromMoments(const CentralMoments& moments) {
     const double skewness = moments.Skewness();
     // 2 (1-k) sqrt(1+2k)/(1+3k) = G1, multiplied by 1 + 3k > 0 to take the pole away.
@@ -22,6 +25,9 @@ Outcome<GeneralisedPareto> ParetoFromMoments(const CentralMoments& moments) {
     return Checked(GeneralisedPareto::Make({xi, alpha, *kappa}));
 }
 
+// A Pareto has the L-moments (Hosking and Wallis 1987)
+//     l1 = xi + alpha/(1+k),   l2 = alpha/((1+k)(2+k)),   t3 = (1-k)/(3+k)
+// and the three solve in closed form.
 Outcome<GeneralisedPareto> ParetoFromLMoments(const LMoments& moments) {
     const double t3 = moments.LSkewness();
     if (!(t3 > -1 && t3 < 1)) {
@@ -33,6 +39,7 @@ Outcome<GeneralisedPareto> ParetoFromLMoments(const LMoments& moments) {
     return Checked(GeneralisedPareto::Make({xi, alpha, kappa}));
 }
 
+// With xi known the squared ratio of mean exceedance and standard deviation is 1 + 2k.
 Outcome<GeneralisedPareto> ParetoAboveFromMoments(double threshold, const CentralMoments& moments) {
     const double mean = moments.mean - threshold;
     if (!(mean > 0)) {
@@ -43,6 +50,8 @@ Outcome<GeneralisedPareto> ParetoAboveFromMoments(double threshold, const Centra
                                            LocationType::Fixed));
 }
 
+// With xi known the L-Cv of the exceedances is 1/(2+k). It lies between 0 and 1 for every variable
+// that takes no negative values; a sample with values below the threshold can leave that range.
 Outcome<GeneralisedPareto> ParetoAboveFromLMoments(double threshold, const LMoments& moments) {
     const double mean = moments.l1 - threshold;
     if (!(mean > 0)) {

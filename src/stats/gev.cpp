@@ -8,6 +8,8 @@ namespace ryn::stats {
 
 namespace {
 
+// 1 - kappa z must not be negative: the bound lies at z = 1/kappa, above for kappa > 0 and below
+// for kappa < 0. A shape that counts as 0 has no bound, though alpha/kappa would be a number.
 Interval SupportOf(const LocationScaleShape& p) {
     Interval support;
     if (IsExponentialLimit(p.kappa)) {
@@ -30,6 +32,9 @@ Gev::Gev(const LocationScaleShape& values)
       logAlpha(std::log(values.alpha)),
       support(SupportOf(values)) {}
 
+// With y = -ln(1 - kappa z)/kappa the distribution function is exp(-exp(-y)), and
+// dy/dx = exp(kappa y)/alpha. So ln f = -exp(-y) - y + ln(dy/dx)
+//                                     = -ln alpha - (1 - kappa) y - exp(-y).
 double Gev::LogDensityInside(double x) const {
     const double y = ReducedVariate(x);
     const double hazard = std::exp(-y);
@@ -44,10 +49,13 @@ double Gev::CdfInside(double x) const {
     return std::exp(-std::exp(-ReducedVariate(x)));
 }
 
+// For large y this is exp(-y) to the last digit, where 1 - F would be 0.
 double Gev::SurvivalInside(double x) const {
     return -std::expm1(-std::exp(-ReducedVariate(x)));
 }
 
+// F = exp(-exp(-y)) solved for y; the two forms differ only in how ln F is had: of a given F, or as
+// log1p(-e) of a small exceedance.
 double Gev::QuantileInside(double probability) const {
     return p.xi + p.alpha * StandardOfReduced(-std::log(-std::log(probability)), p.kappa);
 }

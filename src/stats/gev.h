@@ -19,12 +19,15 @@ class Gev {
     /// Nothing unless all three are finite and alpha > 0.
     static std::optional<Gev> Make(const LocationScaleShape& values);
 
+    /// The parameters as they were given to Make.
     const LocationScaleShape& Values() const { return p; }
 
     Interval Support() const { return support; }
+    /// With x finite and in Support().
     double LogDensityInside(double x) const;
     double CdfInside(double x) const;
     double SurvivalInside(double x) const;
+    /// With the probability strictly between 0 and 1.
     double QuantileInside(double probability) const;
     double QuantileOfExceedanceInside(double exceedance) const;
     /// y, which is -ln(-ln F).
@@ -32,6 +35,7 @@ class Gev {
     double ReducedVariateOfProbability(double probability) const;
     /// z.
     double StandardVariate(double x) const;
+    /// In the order in which results list them.
     ParameterList Parameters() const;
 
   private:

@@ -20,6 +20,8 @@ double ApproximateShape(double lSkewness) {
 
 } // namespace
 
+// A GEV has mean xi + alpha B(kappa), variance alpha^2 A(kappa) and skewness SK(kappa): the
+// skewness gives kappa, then the variance alpha, then the mean xi.
 Outcome<Gev> GevFromMoments(const CentralMoments& moments) {
     const double skewness = moments.Skewness();
     // The factor 1 + 3 kappa is positive and takes the pole at kappa = -1/3 out of the way of the
@@ -36,6 +38,11 @@ Outcome<Gev> GevFromMoments(const CentralMoments& moments) {
     return Checked(Gev::Make({xi, alpha, *kappa}));
 }
 
+// A GEV has the L-moments (Hosking 1990)
+//     l1 = xi + alpha B(kappa)
+//     l2 = alpha Gamma(1 + kappa) (1 - 2^-kappa)/kappa
+// and an L-skewness that falls from 1 at kappa = -1 to -1, so that every |t3| < 1 has one kappa.
+// Its mean is infinite at -1; the bracket ends just above.
 Outcome<Gev> GevFromLMoments(const LMoments& moments) {
     const double t3 = moments.LSkewness();
     const FitFailure outside = LMomentsOutOfRange(moments.LCv(), t3);

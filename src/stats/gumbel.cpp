@@ -11,6 +11,7 @@ std::optional<Gumbel> Gumbel::Make(const LocationScale& values) {
 
 Gumbel::Gumbel(const LocationScale& values) : p(values), logAlpha(std::log(values.alpha)) {}
 
+// F = exp(-exp(-z)), so f = exp(-z) exp(-exp(-z))/alpha.
 double Gumbel::LogDensityInside(double x) const {
     const double z = StandardVariate(x);
     const double hazard = std::exp(-z);
@@ -22,10 +23,12 @@ double Gumbel::CdfInside(double x) const {
     return std::exp(-std::exp(-StandardVariate(x)));
 }
 
+// For large z this is exp(-z) to the last digit, where 1 - F would be 0.
 double Gumbel::SurvivalInside(double x) const {
     return -std::expm1(-std::exp(-StandardVariate(x)));
 }
 
+// ln F is taken of a given F, or as log1p(-e) of a small exceedance.
 double Gumbel::QuantileInside(double probability) const {
     return p.xi - p.alpha * std::log(-std::log(probability));
 }

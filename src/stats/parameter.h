@@ -19,6 +19,7 @@ struct Parameter {
 
 /// All parameters of a distribution, in the order in which results list them.
 using ParameterList = FixedList<Parameter, 3>;
+/// The symbols alone, where there is no fit to take values from.
 using SymbolList = FixedList<std::string_view, 3>;
 
 /// Values of a location and scale family, in the unit of the series.

@@ -5,6 +5,8 @@
 
 namespace ryn::stats {
 
+// With Poisson arrivals the annual maximum stays below x with probability exp(-rate e), and that is
+// 1 - 1/T: e = -ln(1 - 1/T)/rate, which tends to 1/(rate T) for long periods.
 double ExceedanceOfPeriod(double period, const SeriesFrame& frame, PeriodMeaning meaning) {
     double e = 1 / period;
     if (frame.kind == SeriesKind::PartialDuration) {

@@ -11,7 +11,9 @@ namespace {
 
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 
-// b_r of the values less `shift`.
+// b_r of the values less `shift`. The weight of b_r is that of b_(r-1) times (i - r)/(n - r); the
+// factors in i are built up along the sample, and those in n are divided out at the end, one by
+// one, since their product would outgrow an integer.
 WeightedMoments Weighted(std::span<const double> sorted, double shift) {
     const auto n = static_cast<double>(sorted.size());
     double s0 = 0;
@@ -107,6 +109,8 @@ LMoments LMomentsOf(const WeightedMoments& b) {
             20 * b.b3 - 30 * b.b2 + 12 * b.b1 - b.b0};
 }
 
+// b_r of x + c is b_r + c/(r + 1), and in l2 to l4 these terms cancel: they may as well never
+// enter.
 LMoments LMomentsOfSorted(std::span<const double> sorted) {
     const double median = sorted.empty() ? 0.0 : sorted[sorted.size() / 2];
     LMoments moments = LMomentsOf(Weighted(sorted, median));

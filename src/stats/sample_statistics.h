@@ -51,8 +51,11 @@ struct LMoments {
     double l3 = 0;
     double l4 = 0;
 
+    /// l2/l1; means something for a variable that takes no negative values.
     double LCv() const { return l2 / l1; }
+    /// l3/l2, between -1 and 1 from three values that are not all equal.
     double LSkewness() const { return l3 / l2; }
+    /// l4/l2; that of a distribution lies between -1/4 and 1.
     double LKurtosis() const { return l4 / l2; }
 };
 
