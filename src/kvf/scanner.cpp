@@ -105,7 +105,7 @@ std::string_view KvfScanner::Word() const {
 }
 
 bool KvfScanner::ReadString(std::string* value) {
-    const std::size_t column = Column();
+    const std::size_t opening = position;
     value->clear();
     Take('"');
     for (;;) {
@@ -116,7 +116,7 @@ bool KvfScanner::ReadString(std::string* value) {
             return true;
         if (AtLineEnd())
             return Expected("a closing quote for the text that begins in column " +
-                            std::to_string(column));
+                            std::to_string(ColumnOf(opening)));
         if (!ReadEscape(value))
             return false;
     }
@@ -158,13 +158,13 @@ std::string KvfScanner::Found() const {
 }
 
 bool KvfScanner::Fail(const std::string& what, const std::string& found) {
-    error =
-        KvfSyntaxError{line, static_cast<int>(Column()), "expected " + what + ", found " + found};
+    error = KvfSyntaxError{line, static_cast<int>(ColumnOf(position)),
+                           "expected " + what + ", found " + found};
     return false;
 }
 
-std::size_t KvfScanner::Column() const {
-    const std::string_view before = text.substr(lineStart, position - lineStart);
+std::size_t KvfScanner::ColumnOf(std::size_t place) const {
+    const std::string_view before = text.substr(lineStart, place - lineStart);
     const auto isFirstByte = [](char c) { return (static_cast<unsigned char>(c) & 0xC0) != 0x80; };
     return 1 + static_cast<std::size_t>(std::count_if(before.begin(), before.end(), isFirstByte));
 }

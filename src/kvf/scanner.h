@@ -50,7 +50,8 @@ class KvfScanner {
     bool ReadEscape(std::string* value);
     std::string Found() const;
     bool Fail(const std::string& what, const std::string& found);
-    std::size_t Column() const;
+    /// For errors alone: it counts from the start of the line, which can be the whole file.
+    std::size_t ColumnOf(std::size_t place) const;
 
     std::string_view text;
     std::size_t position = 0;

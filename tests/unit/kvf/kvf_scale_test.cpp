@@ -47,6 +47,15 @@ TEST(KvfScale, ReadsAndFindsAMillionSiblingsInProportionalTime) {
     EXPECT_LT(large, 40 * small);
 }
 
+TEST(KvfScale, ReadsAMillionTextsOnOneLineInProportionalTime) {
+    std::string text = "T { K = \"\"";
+    for (int i = 1; i < 1'000'000; ++i) // quadratic, this takes many minutes
+        text += ",\"\"";
+    const KvfHandle tree = kvfLoadText(text + " }", "line.ryn");
+    const KvfSection* const target = kvfTargetByNameNum(tree.get(), "T", 1);
+    EXPECT_EQ(kvfGetNoParams(kvfKeywordByNameNum(target, "K", 1)), 1'000'000);
+}
+
 TEST(KvfScale, FindsSectionsThatAreAddedBetweenLookupsInProportionalTime) {
     const KvfHandle tree = kvfCreate();
     const KvfSection* const target = kvfAddTarget(tree.get(), "T");
