@@ -10,9 +10,6 @@ namespace {
 
 constexpr int kFirstYear = 100;
 constexpr int kLastYear = 9999;
-// 1 January 100 and 1 January 10000, in days since 30 December 1899.
-constexpr double kFirstDay = -657434.0;
-constexpr double kPastLastDay = 2958466.0;
 constexpr std::int64_t kSecondsPerDay = 86400;
 
 // Days since 30 December 1899 of a civil date, and back, by counting 400-year eras from 1 March of
@@ -138,24 +135,12 @@ std::string COleDateTime::Format(std::string_view pattern) const {
     return text;
 }
 
-COleDateTime COleDateTime::FromLinear(double linear) {
-    COleDateTime date;
-    if (!(linear >= kFirstDay && linear < kPastLastDay))
-        return date;
-    if (linear <= -kHalfSecond) {
-        const double whole = std::floor(linear);
-        linear = whole + (whole - linear);
-    }
-    date.count = linear;
-    return date;
-}
-
 COleDateTime COleDateTime::operator+(COleDateTimeSpan span) const {
-    return FromLinear(LinearCount() + span.GetTotalDays());
+    return FromLinearCount(LinearCount() + span.GetTotalDays());
 }
 
 COleDateTime COleDateTime::operator-(COleDateTimeSpan span) const {
-    return FromLinear(LinearCount() - span.GetTotalDays());
+    return FromLinearCount(LinearCount() - span.GetTotalDays());
 }
 
 COleDateTimeSpan COleDateTime::operator-(const COleDateTime& other) const {

@@ -62,6 +62,16 @@ class COleDateTime {
         return whole - (count - whole);
     }
 
+    /// The date of a linear count; invalid when it is out of range or NaN.
+    static COleDateTime FromLinearCount(double linear) {
+        COleDateTime date;
+        if (linear > -kHalfSecond && linear < kPastLastDay)
+            date.count = linear;
+        else if (linear >= kFirstDay && linear <= -kHalfSecond)
+            date.count = std::floor(linear) + (std::floor(linear) - linear);
+        return date;
+    }
+
     Fields GetFields() const;
     int GetYear() const { return GetFields().year; }
     int GetMonth() const { return GetFields().month; }
@@ -96,7 +106,9 @@ class COleDateTime {
     static constexpr double kHalfSecond = 5.787037037037037e-6;
 
   private:
-    static COleDateTime FromLinear(double linear);
+    // 1 January 100 and 1 January 10000, in days since 30 December 1899.
+    static constexpr double kFirstDay = -657434.0;
+    static constexpr double kPastLastDay = 2958466.0;
 
     // A NaN stands for "invalid", so that a date takes the room of its number: a series of 10^7
     // samples holds as many dates.

@@ -62,7 +62,7 @@ void MovePeriod(Period& period, const COleDateTime& date, std::vector<int>& miss
 
 } // namespace
 
-AnnualMaxima SelectAnnualMaxima(std::vector<STSItem>& samples, const SelectionRules& rules) {
+AnnualMaxima SelectAnnualMaxima(SampleArray& samples, const SelectionRules& rules) {
     AnnualMaxima result;
     if (samples.empty() || !NeededDatesAreValid(rules))
         return result;

@@ -20,6 +20,6 @@ struct AnnualMaxima {
 /// whose dates are invalid.
 ///
 /// `samples` are in ascending time order with their marks at 0. Time is linear in their number.
-AnnualMaxima SelectAnnualMaxima(std::vector<STSItem>& samples, const SelectionRules& rules);
+AnnualMaxima SelectAnnualMaxima(SampleArray& samples, const SelectionRules& rules);
 
 } // namespace ryn

@@ -17,7 +17,7 @@ constexpr double kHighest = std::numeric_limits<double>::max();
 /// Marks independent peaks in two passes and a third by level.
 class PeakMarker {
   public:
-    PeakMarker(std::vector<STSItem>& series, const SelectionRules& selectionRules)
+    PeakMarker(SampleArray& series, const SelectionRules& selectionRules)
         : samples(series),
           rules(selectionRules) {
         if (rules.IncludeSeasonalAnalysis)
@@ -49,7 +49,7 @@ class PeakMarker {
     bool TakesOverBackward(Index j);
     bool AreIndependent(Index earlier, Index later, double trough);
 
-    std::vector<STSItem>& samples;
+    SampleArray& samples;
     const SelectionRules& rules;
     std::optional<Season> season;
 };
@@ -132,7 +132,7 @@ void PeakMarker::UnmarkByLevel() {
     }
 }
 
-void MarkPeaks(std::vector<STSItem>& samples, const SelectionRules& rules) {
+void MarkPeaks(SampleArray& samples, const SelectionRules& rules) {
     if (!rules.InterTimeSpecified) {
         for (STSItem& sample : samples)
             sample.selected = 1;
@@ -144,7 +144,7 @@ void MarkPeaks(std::vector<STSItem>& samples, const SelectionRules& rules) {
     marker.UnmarkByLevel();
 }
 
-std::vector<const STSItem*> Marked(const std::vector<STSItem>& samples) {
+std::vector<const STSItem*> Marked(const SampleArray& samples) {
     std::vector<const STSItem*> marked;
     for (const STSItem& sample : samples)
         if (sample.selected != 0)
@@ -185,8 +185,7 @@ void KeepLargest(const SelectionRules& rules, PartialDurations* result) {
 
 } // namespace
 
-PartialDurations SelectPartialDurations(std::vector<STSItem>& samples,
-                                        const SelectionRules& rules) {
+PartialDurations SelectPartialDurations(SampleArray& samples, const SelectionRules& rules) {
     PartialDurations result;
     result.Threshold = rules.Threshold;
     result.AvgAnNum = rules.AvgAnNum;

@@ -30,6 +30,6 @@ struct PartialDurations {
 ///
 /// `samples` are in ascending time order with their marks at 0. Each pass is linear in their
 /// number.
-PartialDurations SelectPartialDurations(std::vector<STSItem>& samples, const SelectionRules& rules);
+PartialDurations SelectPartialDurations(SampleArray& samples, const SelectionRules& rules);
 
 } // namespace ryn

@@ -47,6 +47,15 @@ COleDateTimeSpan StartSpan(double hours) {
     return {static_cast<long>(days), rest / 3600, rest / 60 % 60, rest % 60};
 }
 
+/// std::floor without its call, which this loop's speed hangs on; the same for every number below
+/// 2^62, and beyond it a date is out of range anyway.
+double Floor(double value) {
+    if (!(std::fabs(value) < 0x1p62))
+        return value;
+    const auto whole = static_cast<double>(static_cast<long long>(value));
+    return whole > value ? whole - 1.0 : whole;
+}
+
 struct Axis {
     AxisKind kind = AxisKind::EquidistantRelative;
     std::string date = "1900-01-01"; // where a relative axis counts from
@@ -87,7 +96,7 @@ bool ReadAxis(const TsqHeader* header, Axis* axis) {
 /// Days from the start date to a step of an equidistant axis, whose stored time is not looked at.
 COleDateTimeSpan EquidistantSpan(int index, double stepSeconds) {
     const double seconds = index * stepSeconds;
-    const double days = std::floor(seconds / kSecondsPerDay);
+    const double days = Floor(seconds / kSecondsPerDay);
     const auto rest = static_cast<int>(seconds - days * kSecondsPerDay);
     return {static_cast<long>(days), rest / 3600, rest / 60 % 60, rest % 60};
 }
@@ -103,7 +112,7 @@ struct CTsqValues::OpenItem {
     TsqHeaderHandle header;
     TsqFileHandle file;
     Axis axis;
-    COleDateTime startDate;
+    double startCount = 0.0; // the start date's linear count
     double toSecondsFactor = 1.0;
     double toSecondsOffset = 0.0;
     int itemIndex = 0;
@@ -122,10 +131,11 @@ struct CTsqValues::OpenItem {
 
     double Seconds(double time) const { return time * toSecondsFactor + toSecondsOffset; }
     COleDateTime DateByFile(double time) const {
-        return startDate + COleDateTimeSpan(std::floor(Seconds(time)) / kSecondsPerDay);
+        return COleDateTime::FromLinearCount(startCount + Floor(Seconds(time)) / kSecondsPerDay);
     }
     COleDateTime DateByStep(int index) const {
-        return startDate + EquidistantSpan(index, axis.step * toSecondsFactor);
+        return COleDateTime::FromLinearCount(
+            startCount + EquidistantSpan(index, axis.step * toSecondsFactor).GetTotalDays());
     }
 
     Status UnderstandAxis(const std::string& path);
@@ -148,7 +158,8 @@ Status CTsqValues::OpenItem::UnderstandAxis(const std::string& path) {
     if (axis.IsEquidistant() &&
         !(std::fabs(Seconds(axis.step)) * axis.count < 3600.0 * kLongestOffset))
         return Status::InputFault(path + ": the step of the time axis is out of range");
-    startDate = ParseDateAndTime(axis.date + " " + axis.time) + StartSpan(hours);
+    const COleDateTime startDate = ParseDateAndTime(axis.date + " " + axis.time) + StartSpan(hours);
+    startCount = startDate.LinearCount();
     if (!startDate.IsValid())
         return Status::InputFault(path + ": the time axis starts at no valid date: \"" + axis.date +
                                   " " + axis.time + "\"");
@@ -257,7 +268,7 @@ bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) {
     readError = Open(path, itemIndex, &open);
     if (!readError)
         return false;
-    std::vector<STSItem> read;
+    SampleArray read;
     read.reserve(static_cast<std::size_t>(open.axis.count));
     const bool equidistant = open.axis.IsEquidistant();
     bool datesValid = true;
@@ -277,7 +288,7 @@ bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) {
 }
 
 void CTsqValues::ClearSeries() {
-    samples = std::vector<STSItem>();
+    samples = SampleArray();
     count = 0;
 }
 

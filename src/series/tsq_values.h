@@ -78,7 +78,7 @@ class CTsqValues {
     STSItem first;
     STSItem last;
     // By ReadSeries only: one for each time step, in file order.
-    std::vector<STSItem> samples;
+    SampleArray samples;
 
     static constexpr double kHighestValue = 1.7976931348623157e308;
 

@@ -21,7 +21,7 @@ inline COleDateTime At(std::string_view text) {
     return {number(0, 4), number(5, 2), number(8, 2), number(11, 2), number(14, 2), number(17, 2)};
 }
 
-using Samples = std::vector<STSItem>;
+using Samples = SampleArray;
 
 inline Samples SamplesOf(std::initializer_list<std::pair<std::string_view, double>> entries) {
     Samples samples;
