@@ -1,0 +1,234 @@
+#include "import/clock_text.h"
+
+#include <array>
+#include <vector>
+
+#include "import/date_text.h"
+#include "import/text_cursor.h"
+
+namespace ryn {
+
+namespace {
+
+struct Zone {
+    std::string_view name;
+    int minutes;
+};
+
+// The abbreviations that gauge networks write. BST is British Summer Time.
+constexpr Zone kZones[] = {
+    {"z", 0},       {"utc", 0},    {"gmt", 0},    {"ut", 0},     {"wet", 0},    {"west", 60},
+    {"bst", 60},    {"cet", 60},   {"mez", 60},   {"met", 60},   {"cest", 120}, {"mesz", 120},
+    {"mest", 120},  {"eet", 120},  {"eest", 180}, {"est", -300}, {"edt", -240}, {"cst", -360},
+    {"cdt", -300},  {"mst", -420}, {"mdt", -360}, {"pst", -480}, {"pdt", -420}, {"akst", -540},
+    {"akdt", -480}, {"hst", -600}, {"ast", -240}, {"adt", -180}, {"nzst", 720}, {"nzdt", 780},
+    {"jst", 540},   {"aest", 600}, {"aedt", 660}, {"awst", 480}, {"acst", 570}};
+
+/// "+01:00", "-0330", "+1".
+bool ParseOffset(std::string_view text, int* minutes) {
+    TextCursor cursor(text);
+    const bool isNegative = cursor.Peek() == '-';
+    cursor.Skip();
+    int hourDigits = 0;
+    int minuteDigits = 0;
+    const int hours = cursor.TakeNumber(2, &hourDigits);
+    const bool hasColon = cursor.Take(':');
+    const int rest = cursor.TakeNumber(2, &minuteDigits);
+    *minutes = (hours * 60 + rest) * (isNegative ? -1 : 1);
+    return hourDigits > 0 && cursor.IsAtEnd() && hours <= 14 && rest <= 59 &&
+           (minuteDigits == 2 || (minuteDigits == 0 && !hasColon));
+}
+
+/// Digits behind a decimal sign as milliseconds; finer ones are cut off.
+int TakeFraction(TextCursor* cursor) {
+    int millis = 0;
+    int count = 0;
+    for (; IsDigit(cursor->Peek()); cursor->Skip(), ++count)
+        if (count < 3)
+            millis = millis * 10 + (cursor->Peek() - '0');
+    for (; count < 3; ++count)
+        millis *= 10;
+    return millis;
+}
+
+/// ":MM", ":MM:SS", ":MM:SS.fff" behind the hour.
+bool TakeColonClock(TextCursor* cursor, TimeParts* parts) {
+    int digits = 0;
+    parts->minute = cursor->TakeNumber(2, &digits);
+    if (digits != 2)
+        return false;
+    if (!cursor->Take(':'))
+        return true;
+    parts->second = cursor->TakeNumber(2, &digits);
+    if (digits != 2)
+        return false;
+    if ((cursor->Peek() == '.' || cursor->Peek() == ',') && cursor->Rest().size() > 1) {
+        cursor->Skip();
+        parts->millisecond = TakeFraction(cursor);
+    }
+    return true;
+}
+
+/// "AM" or "PM" behind a time of the twelve-hour clock.
+bool TakeHalfOfDay(TextCursor* cursor, TimeParts* parts) {
+    TextCursor ahead = *cursor;
+    ahead.SkipBlanks();
+    const std::string_view word = ahead.TakeWord();
+    const bool isAfternoon = IsOneOf(word, {"pm"});
+    if (!isAfternoon && !IsOneOf(word, {"am"}))
+        return true;
+    if (parts->hour < 1 || parts->hour > 12)
+        return false;
+    parts->hour = parts->hour % 12 + (isAfternoon ? 12 : 0);
+    *cursor = ahead;
+    return true;
+}
+
+/// "HH", "HHMM", "HHMMSS" without colons.
+bool SetPlainClock(int value, int digits, TimeParts* parts) {
+    if (digits == 6) {
+        parts->hour = value / 10000;
+        parts->minute = value / 100 % 100;
+        parts->second = value % 100;
+    } else if (digits == 4) {
+        parts->hour = value / 100;
+        parts->minute = value % 100;
+    } else {
+        parts->hour = value;
+        return digits == 1 || digits == 2;
+    }
+    return true;
+}
+
+} // namespace
+
+bool ParseZone(std::string_view text, int* offsetMinutes) {
+    if (!text.empty() && (text[0] == '+' || text[0] == '-'))
+        return ParseOffset(text, offsetMinutes);
+    constexpr std::size_t kLongestName = 4;
+    if (text.empty() || text.size() > kLongestName)
+        return false;
+    const std::string name = Lowercase(text);
+    for (const Zone& zone : kZones) {
+        if (zone.name == name) {
+            *offsetMinutes = zone.minutes;
+            return true;
+        }
+    }
+    return false;
+}
+
+bool ParseZoneTail(std::string_view text, TimeParts* parts) {
+    text = Trimmed(text);
+    if (text.empty())
+        return true;
+    int minutes = 0;
+    if (!ParseZone(text, &minutes))
+        return false;
+    parts->offsetMinutes = minutes;
+    return true;
+}
+
+bool ParseClock(std::string_view text, TimeParts* parts) {
+    TextCursor cursor(text);
+    int digits = 0;
+    const int value = cursor.TakeNumber(6, &digits);
+    if (digits == 0 || IsDigit(cursor.Peek()))
+        return false;
+    if (cursor.Take(':') || cursor.Take('h')) {
+        parts->hour = value;
+        if (digits > 2 || !TakeColonClock(&cursor, parts))
+            return false;
+    } else if (!SetPlainClock(value, digits, parts)) {
+        return false;
+    }
+    return TakeHalfOfDay(&cursor, parts) && ParseZoneTail(cursor.Rest(), parts);
+}
+
+std::optional<Millis> ParseDuration(std::string_view text) {
+    TextCursor cursor(text);
+    const Millis sign = cursor.Take('-') ? -1 : 1;
+    int digits = 0;
+    Millis first = cursor.TakeNumber(8, &digits);
+    if (digits == 0)
+        return std::nullopt;
+    Millis days = 0;
+    cursor.SkipBlanks();
+    if (IsLetter(cursor.Peek())) {
+        if (!IsOneOf(cursor.TakeWord(), {"d", "day", "days"}))
+            return std::nullopt;
+        days = first;
+        cursor.Take(',');
+        cursor.SkipBlanks();
+        if (cursor.IsAtEnd())
+            return sign * days * kMillisPerDay;
+        first = cursor.TakeNumber(2, &digits);
+    }
+    TimeParts parts;
+    if (digits == 0 || !cursor.Take(':') || !TakeColonClock(&cursor, &parts) || !cursor.IsAtEnd() ||
+        parts.second < 0 || parts.minute > 59 || parts.second > 59)
+        return std::nullopt;
+    return sign *
+           (days * kMillisPerDay + first * kMillisPerHour + parts.minute * kMillisPerMinute +
+            parts.second * kMillisPerSecond + (parts.millisecond > 0 ? parts.millisecond : 0));
+}
+
+int MonthOfName(std::string_view name) {
+    if (name.size() < 3)
+        return 0;
+    // By the first letters, which are enough in these languages together; the longer entries stand
+    // where three letters would not do (juin and juillet) or are not ASCII.
+    struct Month {
+        std::string_view start;
+        int number;
+    };
+    constexpr Month kMonths[] = {{"juil", 7},
+                                 {"jui", 6},
+                                 {"jan", 1},
+                                 {"gen", 1},
+                                 {"ene", 1},
+                                 {"feb", 2},
+                                 {"f\xC3\xA9v", 2},
+                                 {"fev", 2},
+                                 {"mar", 3},
+                                 {"m\xC3\xA4r", 3},
+                                 {"maa", 3},
+                                 {"mrt", 3},
+                                 {"mrz", 3},
+                                 {"apr", 4},
+                                 {"avr", 4},
+                                 {"abr", 4},
+                                 {"may", 5},
+                                 {"mai", 5},
+                                 {"mei", 5},
+                                 {"mag", 5},
+                                 {"jun", 6},
+                                 {"giu", 6},
+                                 {"jul", 7},
+                                 {"lug", 7},
+                                 {"aug", 8},
+                                 {"aou", 8},
+                                 {"ao\xC3\xBB", 8},
+                                 {"ago", 8},
+                                 {"sep", 9},
+                                 {"set", 9},
+                                 {"oct", 10},
+                                 {"okt", 10},
+                                 {"ott", 10},
+                                 {"out", 10},
+                                 {"nov", 11},
+                                 {"dec", 12},
+                                 {"dez", 12},
+                                 {"dic", 12},
+                                 {"d\xC3\xA9"
+                                  "c",
+                                  12}};
+    constexpr std::size_t kLongestName = 10;
+    const std::string lower = Lowercase(name);
+    for (const Month& month : kMonths)
+        if (lower.size() <= kLongestName && lower.compare(0, month.start.size(), month.start) == 0)
+            return month.number;
+    return 0;
+}
+
+} // namespace ryn

@@ -1,0 +1,115 @@
+#include "import/import.h"
+
+#include <array>
+
+#include "base/path_parts.h"
+#include "import/dif_table.h"
+#include "import/guess_layout.h"
+#include "import/item_columns.h"
+#include "import/missing_codes.h"
+#include "import/netcdf_series.h"
+#include "import/read_rows.h"
+#include "import/sample_order.h"
+#include "import/write_series.h"
+
+namespace ryn {
+
+namespace {
+
+Status ReadStart(TextSource& source, std::string* start) {
+    std::array<char, 64> buffer{};
+    std::size_t got = 0;
+    Status status = source.Read(buffer.data(), buffer.size(), &got);
+    start->assign(buffer.data(), got);
+    return status ? source.Rewind() : status;
+}
+
+/// Names and units of the items: as the user says, else as the table says.
+void NameItems(const ImportSettings& settings, const std::string& fallbackName,
+               ImportReport* report) {
+    for (std::size_t i = 0; i < report->items.size(); ++i) {
+        ImportedItem& item = report->items[i];
+        if (!settings.name.empty() && report->items.size() == 1)
+            item.name = settings.name;
+        if (item.name.empty())
+            item.name = report->items.size() == 1 ? fallbackName
+                                                  : fallbackName + " " + std::to_string(i + 1);
+        if (!settings.unit.empty())
+            item.unit = settings.unit;
+    }
+}
+
+Status ReadPlainTable(TextSource& source, const ImportSettings& settings, TableSamples* samples,
+                      ImportReport* report) {
+    TableLayout& layout = report->layout;
+    report->form = "table";
+    Status status = GuessLayout(source, settings, &layout);
+    if (!status)
+        return status;
+    for (const std::size_t item : layout.items)
+        report->items.push_back(
+            {ColumnTitle(layout, item), layout.columns[item].name, layout.columns[item].unit, {}});
+    for (const std::size_t other : OtherItems(layout))
+        report->otherItems.push_back(ColumnTitle(layout, other));
+    report->notes = layout.notes;
+    status = ReadRows(source, layout, settings.missing, samples, report);
+    if (status && settings.missing.searchCodes)
+        TakeOutCodes(layout, samples, report);
+    return status;
+}
+
+Status Finish(const std::string& source, const ImportSettings& settings, TableSamples* samples,
+              ImportReport* report) {
+    DropMissing(samples, report);
+    if (samples->Count() == 0)
+        return Status::InputFault(
+            source + ": no row has a value: " + std::to_string(report->rowsRead) + " were read");
+    return OrderSamples(source, settings.order, settings.duplicates, samples, report);
+}
+
+} // namespace
+
+Status ImportTable(TextSource& source, const ImportOptions& options,
+                   const std::string& fallbackName, TableSamples* samples, ImportReport* report) {
+    report->source = source.Name();
+    ImportSettings settings;
+    Status status = ParseImportOptions(options, &settings);
+    std::string start;
+    if (status)
+        status = ReadStart(source, &start);
+    if (status)
+        status = IsDif(start) ? ReadDif(source, settings, samples, report)
+                              : ReadPlainTable(source, settings, samples, report);
+    if (!status)
+        return status;
+    NameItems(settings, fallbackName, report);
+    return Finish(source.Name(), settings, samples, report);
+}
+
+Status ImportFile(const std::string& input, const std::string& output, const ImportOptions& options,
+                  ImportReport* report) {
+    const std::string title = SplitPath(input).name;
+    std::unique_ptr<TextSource> source;
+    Status status = FileSource::Open(input, &source);
+    std::string start;
+    if (status)
+        status = ReadStart(*source, &start);
+    if (!status)
+        return status;
+    TableSamples samples;
+    if (IsNetcdf(start)) {
+        ImportSettings settings;
+        status = ParseImportOptions(options, &settings);
+        report->source = input;
+        if (status)
+            status = ReadNetcdfSeries(input, settings, &samples, report);
+        NameItems(settings, title, report);
+        if (status)
+            status = Finish(input, settings, &samples, report);
+    } else {
+        status = ImportTable(*source, options, title, &samples, report);
+    }
+    return status ? WriteSeries(output, title, samples, report) : status;
+}
+
+} // namespace ryn

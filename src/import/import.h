@@ -1,0 +1,25 @@
+#pragma once
+
+#include <string>
+
+#include "base/status.h"
+#include "import/import_options.h"
+#include "import/import_report.h"
+#include "import/table_samples.h"
+#include "import/text_source.h"
+
+namespace ryn {
+
+/// Brings a table of text, a DONAR DIF file or a netCDF file of another program into a data file.
+/// docs/import.md tells what is understood and how. Nothing is written when something is refused;
+/// an existing output is replaced when the new file is complete. The report is filled as far as the
+/// import came.
+Status ImportFile(const std::string& input, const std::string& output, const ImportOptions& options,
+                  ImportReport* report);
+
+/// The same up to the samples, which stay in memory. `fallbackName` names an item that the table
+/// does not name.
+Status ImportTable(TextSource& source, const ImportOptions& options,
+                   const std::string& fallbackName, TableSamples* samples, ImportReport* report);
+
+} // namespace ryn

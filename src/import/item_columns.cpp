@@ -1,0 +1,166 @@
+#include "import/item_columns.h"
+
+#include <algorithm>
+#include <cmath>
+
+#include "import/number_field.h"
+#include "import/table_text.h"
+#include "import/time_names.h"
+
+namespace ryn {
+
+namespace {
+
+bool IsTimeColumn(const TableLayout& layout, std::size_t column) {
+    return std::any_of(layout.time.columns.begin(), layout.time.columns.end(),
+                       [column](const TimeColumn& time) { return time.column == column; });
+}
+
+/// Names of what is not measured: who, where, which row, how good.
+bool IsLabelName(const std::string& name) {
+    const std::vector<std::string> words = Words(name);
+    return std::any_of(words.begin(), words.end(), [](const std::string& word) {
+        return IsOneOf(word, {"station",
+                              "stations",
+                              "stn",
+                              "site",
+                              "siteid",
+                              "id",
+                              "no",
+                              "nr",
+                              "num",
+                              "number",
+                              "nummer",
+                              "code",
+                              "cod",
+                              "cd",
+                              "wmo",
+                              "index",
+                              "idx",
+                              "row",
+                              "obs",
+                              "lat",
+                              "latitude",
+                              "lon",
+                              "long",
+                              "longitude",
+                              "elev",
+                              "elevation",
+                              "flag",
+                              "flags",
+                              "qc",
+                              "qn",
+                              "quality",
+                              "qual",
+                              "status",
+                              "grade",
+                              "gauge",
+                              "messstelle",
+                              "stationsnummer",
+                              "stationskennung",
+                              "stationid",
+                              "agency"});
+    });
+}
+
+struct ColumnValues {
+    std::vector<float> values;
+    bool areWhole = true;
+};
+
+ColumnValues ValuesOf(const SampleRows& rows, std::size_t column) {
+    ColumnValues found;
+    for (const auto& fields : rows.All()) {
+        const NumberField number = ReadNumber(fields[column], rows.Decimal());
+        if (number.kind != NumberKind::Value && number.kind != NumberKind::Marked)
+            continue;
+        found.values.push_back(number.value);
+        found.areWhole = found.areWhole && fields[column].find_first_of(".,") == std::string::npos;
+    }
+    return found;
+}
+
+/// A whole number that never changes, other than zero: the number of a station.
+bool IsConstantLabel(const ColumnValues& column) {
+    constexpr std::size_t kEnough = 3;
+    return column.areWhole && column.values.size() >= kEnough && column.values[0] != 0.0F &&
+           std::all_of(column.values.begin(), column.values.end(),
+                       [&column](float value) { return value == column.values[0]; });
+}
+
+/// A number that grows by one from row to row, but for few jumps.
+bool IsCounter(const ColumnValues& column) {
+    constexpr std::size_t kEnough = 5;
+    if (!column.areWhole || column.values.size() < kEnough)
+        return false;
+    std::size_t steps = 0;
+    for (std::size_t i = 1; i < column.values.size(); ++i)
+        steps += column.values[i] == column.values[i - 1] + 1.0F ? 1 : 0;
+    return static_cast<double>(steps) >= 0.95 * static_cast<double>(column.values.size() - 1);
+}
+
+std::optional<std::size_t> FirstMeasurement(const SampleRows& rows, const TableLayout& layout) {
+    // Taken when nothing better is there: "Min" may be a minimum, a constant may be measured.
+    std::optional<std::size_t> namedAsTime;
+    std::optional<std::size_t> constant;
+    for (std::size_t i = 0; i < layout.columns.size(); ++i) {
+        const ColumnLayout& column = layout.columns[i];
+        if (column.kind != ColumnKind::Number || IsTimeColumn(layout, i) ||
+            IsLabelName(column.name))
+            continue;
+        const ColumnValues values = ValuesOf(rows, i);
+        const bool varies = !IsConstantLabel(values) && !IsCounter(values);
+        if (varies && !IsTimeName(column.name))
+            return i;
+        std::optional<std::size_t>& second = varies ? namedAsTime : constant;
+        second = second.value_or(i);
+    }
+    return namedAsTime ? namedAsTime : constant;
+}
+
+Status ChooseNamed(const ImportSettings& settings, TableLayout* layout) {
+    for (const std::string& name : settings.itemColumns) {
+        const std::optional<std::size_t> column = FindColumn(layout->columns, name);
+        if (!column)
+            return NoSuchColumn("--item", name, *layout);
+        if (std::find(layout->items.begin(), layout->items.end(), *column) != layout->items.end())
+            return Status::InputFault("--item " + Quoted(name) + " names a column twice");
+        if (layout->columns[*column].kind == ColumnKind::Text ||
+            layout->columns[*column].kind == ColumnKind::Time)
+            return Status::InputFault("--item " + Quoted(name) + ": column " +
+                                      ColumnTitle(*layout, *column) + " holds no numbers");
+        layout->items.push_back(*column);
+    }
+    return Status::Ok();
+}
+
+} // namespace
+
+Status ChooseItems(const SampleRows& rows, const ImportSettings& settings, TableLayout* layout) {
+    layout->items.clear();
+    if (!settings.itemColumns.empty())
+        return ChooseNamed(settings, layout);
+    const std::optional<std::size_t> column = FirstMeasurement(rows, *layout);
+    if (!column)
+        return Status::InputFault(
+            "no column holds measured numbers; name one with --item if there is");
+    layout->items.push_back(*column);
+    return Status::Ok();
+}
+
+std::vector<std::size_t> OtherItems(const TableLayout& layout) {
+    std::vector<std::size_t> others;
+    for (std::size_t i = 0; i < layout.columns.size(); ++i) {
+        const ColumnLayout& column = layout.columns[i];
+        const bool isChosen =
+            std::find(layout.items.begin(), layout.items.end(), i) != layout.items.end();
+        const bool isOffered = column.kind == ColumnKind::Number ||
+                               (column.kind == ColumnKind::Empty && !column.name.empty());
+        if (isOffered && !isChosen && !IsTimeColumn(layout, i) && !IsTimeName(column.name) &&
+            !IsLabelName(column.name))
+            others.push_back(i);
+    }
+    return others;
+}
+
+} // namespace ryn

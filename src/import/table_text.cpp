@@ -1,0 +1,98 @@
+#include "import/table_text.h"
+
+#include <algorithm>
+
+namespace ryn {
+
+namespace {
+
+constexpr std::string_view kNoBreakSpace = "\xC2\xA0";
+
+bool IsBlankAt(std::string_view text, std::size_t position) {
+    const char c = text[position];
+    return c == ' ' || c == '\t' || c == '\n' || c == '\r';
+}
+
+bool StartsWithRepeated(std::string_view line, char c) {
+    constexpr std::size_t kMergeMark = 7;
+    return line.size() >= kMergeMark && line.find_first_not_of(c) >= kMergeMark;
+}
+
+} // namespace
+
+std::string_view Trimmed(std::string_view text) {
+    for (bool again = true; again && !text.empty();) {
+        again = true;
+        if (IsBlankAt(text, 0))
+            text.remove_prefix(1);
+        else if (text.substr(0, 2) == kNoBreakSpace)
+            text.remove_prefix(2);
+        else if (IsBlankAt(text, text.size() - 1))
+            text.remove_suffix(1);
+        else if (text.size() >= 2 && text.substr(text.size() - 2) == kNoBreakSpace)
+            text.remove_suffix(2);
+        else
+            again = false;
+    }
+    return text;
+}
+
+std::string Lowercase(std::string_view text) {
+    std::string lower(text);
+    for (char& c : lower)
+        c = c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+    return lower;
+}
+
+bool IsDigit(char c) {
+    return c >= '0' && c <= '9';
+}
+
+bool IsLetter(char c) {
+    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
+}
+
+bool IsDigits(std::string_view text) {
+    return !text.empty() && std::all_of(text.begin(), text.end(), IsDigit);
+}
+
+std::vector<std::string> Words(std::string_view text) {
+    std::vector<std::string> words;
+    std::string word;
+    for (const char c : Lowercase(text) + " ") {
+        if (IsLetter(c) || static_cast<unsigned char>(c) >= 0x80) {
+            word += c;
+        } else if (!word.empty()) {
+            words.push_back(word);
+            word.clear();
+        }
+    }
+    return words;
+}
+
+bool IsOneOf(std::string_view text, const std::vector<std::string_view>& words) {
+    const std::string lower = Lowercase(text);
+    return std::find(words.begin(), words.end(), lower) != words.end();
+}
+
+bool IsSeparatorLine(std::string_view line, char delimiter) {
+    line = Trimmed(line);
+    for (const char mark : {'<', '=', '>', '|'})
+        if (StartsWithRepeated(line, mark))
+            return true;
+    const bool onlyMarks = std::none_of(line.begin(), line.end(), [](char c) {
+        return IsDigit(c) || IsLetter(c) || static_cast<unsigned char>(c) >= 0x80 || c == '"';
+    });
+    const bool divided = delimiter != ' ' && line.find(delimiter) != std::string_view::npos;
+    return line.size() >= 3 && onlyMarks && !divided && line.find('*') == std::string_view::npos;
+}
+
+std::string Quoted(std::string_view text) {
+    constexpr std::size_t kShown = 60;
+    std::string shown(text.substr(0, kShown));
+    for (char& c : shown)
+        c = static_cast<unsigned char>(c) < 0x20 ? ' ' : c;
+    return "\"" + shown + (text.size() > kShown ? "...\"" : "\"");
+}
+
+} // namespace ryn

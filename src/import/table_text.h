@@ -1,0 +1,29 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+/// Small questions about a table's text.
+namespace ryn {
+
+/// Without blanks, tabs and no-break spaces at both ends.
+std::string_view Trimmed(std::string_view text);
+/// ASCII letters in lower case; other bytes as they are.
+std::string Lowercase(std::string_view text);
+bool IsDigit(char c);
+bool IsLetter(char c);
+/// All digits and not empty.
+bool IsDigits(std::string_view text);
+/// The runs of letters of a text in lower case: "Water_Year (WY)" gives water, year, wy. A
+/// non-ASCII byte counts as a letter.
+std::vector<std::string> Words(std::string_view text);
+/// True for one of the listed words, compared in lower case.
+bool IsOneOf(std::string_view text, const std::vector<std::string_view>& words);
+/// A line that only divides: no letter and no digit ("=======", "-----"), or a merge tool's mark.
+/// Decimal points, quotes and missing marks in fields do not make one: a delimiter does not occur.
+bool IsSeparatorLine(std::string_view line, char delimiter);
+/// The text in double quotes with line breaks shown as blanks, cut when it is long.
+std::string Quoted(std::string_view text);
+
+} // namespace ryn
