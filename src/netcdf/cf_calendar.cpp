@@ -192,7 +192,7 @@ std::int64_t DayNumber(CfCalendar calendar, const CfDate& date) {
     case CfCalendar::AllLeap:
         return date.year * 366 + DaysBefore(date.month, 366) + date.day - 1;
     case CfCalendar::Day360:
-        return date.year * 360 + (date.month - 1) * 30 + date.day - 1;
+        return date.year * 360 + (date.month - 1) * Int{30} + date.day - 1;
     }
     return 0;
 }

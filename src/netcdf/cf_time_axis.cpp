@@ -98,7 +98,7 @@ class AxisReader {
 
     std::size_t Steps() const { return steps; }
 
-    /// Hands each time to `take`, which gives back a reason for refusing it, or nothing.
+    /// Hands each time to `take`, which gives back a reason for refusing it, or null.
     template <typename Take>
     Status ForEach(Take take) {
         std::vector<double> block(std::min(kBlock, steps));
@@ -108,10 +108,10 @@ class AxisReader {
             if (Status status = file.Read(time, start, count, block.data()); !status)
                 return status;
             for (std::size_t i = 0; i < count[place]; ++i) {
-                const std::string reason = take(block[i] * packing.scale + packing.offset);
-                if (!reason.empty())
-                    return file.InputFault(time,
-                                           reason + " at step " + std::to_string(first + i + 1));
+                const char* const reason = take(block[i] * packing.scale + packing.offset);
+                if (reason != nullptr)
+                    return file.InputFault(time, std::string(reason) + " at step " +
+                                                     std::to_string(first + i + 1));
             }
         }
         return Status::Ok();
@@ -134,7 +134,7 @@ Status ChooseMonths(AxisReader* reader, CfTime* time) {
     bool areWhole = true;
     Status status = reader->ForEach([&](double value) {
         areWhole = areWhole && value == std::floor(value);
-        return std::string();
+        return static_cast<const char*>(nullptr);
     });
     if (status && !areWhole)
         time->UseMeanMonths();
@@ -178,14 +178,14 @@ Status ReadCfTimeAxis(const NcFile& file, const NcVariable& time, TimeOrder orde
         if (Status status = ChooseMonths(&reader, &read.time); !status)
             return status;
     auto& steps = read.milliseconds;
-    const Status status = reader.ForEach([&](double value) -> std::string {
+    Status status = reader.ForEach([&](double value) -> const char* {
         const auto milliseconds = read.time.Milliseconds(value);
         if (!milliseconds)
             return "has no date between the years 100 and 9999";
         if (order == TimeOrder::Ascending && !steps.empty() && *milliseconds <= steps.back())
             return *milliseconds == steps.back() ? "repeats a time" : "goes back in time";
         steps.push_back(*milliseconds);
-        return {};
+        return nullptr;
     });
     if (status)
         *axis = std::move(read);

@@ -68,7 +68,7 @@ std::optional<CfDate> ScanDate(Scanner* scanner) {
     const int sign = scanner->Take('-') ? -1 : 1;
     CfDate date;
     if (scanner->Digits() == 8) { // 19900101
-        date.year = sign * scanner->TakeDigits(4);
+        date.year = static_cast<std::int64_t>(sign) * scanner->TakeDigits(4);
         date.month = scanner->TakeDigits(2);
         date.day = scanner->TakeDigits(2);
         return date;
@@ -76,7 +76,7 @@ std::optional<CfDate> ScanDate(Scanner* scanner) {
     const auto year = scanner->Number(6);
     if (!year)
         return std::nullopt;
-    date.year = sign * *year;
+    date.year = static_cast<std::int64_t>(sign) * *year;
     for (int* const part : {&date.month, &date.day}) {
         if (!scanner->Take('-'))
             return date;

@@ -101,14 +101,6 @@ double MillisecondsInUnit(int unit) {
     return qtyConvertUnit(unit, 1.0, kUnitSecond, &seconds) == 0 ? seconds * 1000.0 : 0.0;
 }
 
-double RoundedToMillisecond(double time, double millisecondsInUnit) {
-    constexpr double kWholeFromHere = 4503599627370496.0; // 2^52: such numbers have no fraction
-    const double milliseconds = time * millisecondsInUnit;
-    return std::abs(milliseconds) < kWholeFromHere
-               ? std::nearbyint(milliseconds) / millisecondsInUnit
-               : time;
-}
-
 int tsqGetTimeAxisType(const TsqHeader* header) {
     return header != nullptr ? header->axis.type : 0;
 }

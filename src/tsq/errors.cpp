@@ -26,11 +26,11 @@ int FailReading(Status status) {
     return static_cast<int>(lastError.Kind());
 }
 
-int FailWriting(Status status, const std::source_location& place) {
+int FailWriting(Status status, SourcePlace place) {
     const int type = FailReading(std::move(status));
     // A copy, since a handler may install another one.
     if (const TsqErrorHandler handler = errorHandler)
-        handler(type, BaseName(place.file_name()), static_cast<int>(place.line()));
+        handler(type, BaseName(place.file), place.line);
     return type;
 }
 

@@ -84,6 +84,14 @@ struct TsqContent {
 /// Milliseconds in a time unit; 0 for a unit that is none.
 double MillisecondsInUnit(int unit);
 /// A time in a unit, rounded to the millisecond.
-double RoundedToMillisecond(double time, double millisecondsInUnit);
+inline double RoundedToMillisecond(double time, double millisecondsInUnit) {
+    constexpr double kLimit = 2251799813685248.0; // 2^51 milliseconds: 71 thousand years
+    // Beside this number doubles have no fraction, so that adding it rounds; a call of nearbyint
+    // for each step that is written would cost more than the rest of the step.
+    constexpr double kRounding = 3.0 * kLimit;
+    const double milliseconds = time * millisecondsInUnit;
+    const bool fits = milliseconds > -kLimit && milliseconds < kLimit;
+    return fits ? ((milliseconds + kRounding) - kRounding) / millisecondsInUnit : time;
+}
 
 } // namespace ryn

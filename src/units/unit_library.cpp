@@ -41,16 +41,16 @@ double UnitConverter::Convert(double value) const {
     return cv_convert_double(converter.get(), value);
 }
 
-void UnitConverter::Free::operator()(cv_converter* converter) const {
-    cv_free(converter);
+void UnitConverter::Free::operator()(cv_converter* freed) const {
+    cv_free(freed);
 }
 
-void UnitLibrary::FreeSystem::operator()(ut_system* system) const {
-    ut_free_system(system);
+void UnitLibrary::FreeSystem::operator()(ut_system* freed) const {
+    ut_free_system(freed);
 }
 
-void UnitLibrary::FreeUnit::operator()(ut_unit* unit) const {
-    ut_free(unit);
+void UnitLibrary::FreeUnit::operator()(ut_unit* freed) const {
+    ut_free(freed);
 }
 
 UnitLibrary::UnitLibrary() {

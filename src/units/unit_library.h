@@ -20,7 +20,7 @@ class UnitConverter {
   private:
     friend class UnitLibrary;
     struct Free {
-        void operator()(cv_converter* converter) const;
+        void operator()(cv_converter* freed) const;
     };
     std::unique_ptr<cv_converter, Free> converter;
 };
@@ -46,10 +46,10 @@ class UnitLibrary {
 
   private:
     struct FreeSystem {
-        void operator()(ut_system* system) const;
+        void operator()(ut_system* freed) const;
     };
     struct FreeUnit {
-        void operator()(ut_unit* unit) const;
+        void operator()(ut_unit* freed) const;
     };
     using Unit = std::unique_ptr<ut_unit, FreeUnit>;
 

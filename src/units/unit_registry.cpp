@@ -44,8 +44,10 @@ std::string UnitRegistry::TextOf(int code) {
 int UnitRegistry::SameUnitInTable(std::string_view text) {
     if (!Library().Knows(text))
         return kUnitUndefined;
+    // Pure numbers are one to UDUNITS: "mm/m" (millimetres a month, to some) would become "0.001".
+    const auto isNumber = [](const UnitRow& row) { return row.code >= 2000 && row.code < 2100; };
     for (const UnitRow& row : UnitTable())
-        if (Library().IsSame(text, row.text))
+        if (!isNumber(row) && Library().IsSame(text, row.text))
             return row.code;
     return kUnitUndefined;
 }

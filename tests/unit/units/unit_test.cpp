@@ -150,6 +150,7 @@ TEST(Units, AnUnknownTextKeepsACodeOfItsOwn) {
     EXPECT_FALSE(IsTableUnit(first));
     EXPECT_TRUE(IsTableUnit(kUnitHour));
     EXPECT_NE(UnitOfText(std::string_view("m\0s", 3)), UnitOfText("m"));
+    EXPECT_EQ(UnitText(UnitOfText("mm/m")), "mm/m"); // and not "0.001"
 }
 
 TEST(UnitsDeathTest, AMissingDatabaseIsAFailureThatNamesItsPlace) {
