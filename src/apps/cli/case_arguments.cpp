@@ -1,0 +1,107 @@
+#include "apps/cli/case_arguments.h"
+
+#include <algorithm>
+#include <memory>
+#include <string_view>
+
+#include "apps/cli/nearest_names.h"
+#include "apps/cli/setting_value.h"
+#include "apps/cli/settings.h"
+#include "params/combination_name.h"
+#include "strings/catalogue.h"
+
+namespace ryn::cli {
+
+namespace {
+
+constexpr std::string_view kDistributions = "ProbabilityDistribution.";
+
+bool IsOfCombination(const std::string& assignment) {
+    return assignment.rfind(kDistributions, 0) == 0;
+}
+
+bool AssignsTo(const CaseArguments& arguments, std::string_view name) {
+    const std::string start = std::string(name) + "=";
+    return std::any_of(arguments.assignments.begin(), arguments.assignments.end(),
+                       [&start](const std::string& text) { return text.rfind(start, 0) == 0; });
+}
+
+Status Assign(CGlobalKvf& root, const CaseArguments& arguments, bool toCombinations,
+              const std::string& callerDirectory) {
+    for (const std::string& assignment : arguments.assignments)
+        if (IsOfCombination(assignment) == toCombinations)
+            if (Status status = ApplyAssignment(root, assignment, callerDirectory); !status)
+                return status;
+    return Status::Ok();
+}
+
+/// A file that is named without an item means its first one.
+void ChooseFirstItems(CGlobalKvf& root, const CaseArguments& arguments) {
+    if (AssignsTo(arguments, "BasicInput.InputFileName") && root.BasicInput().InputItem == 0)
+        root.BasicInput().InputItem = 1;
+    if (AssignsTo(arguments, "DefineEVS.InputFileName") && root.DefineEVS().InputItem == 0)
+        root.DefineEVS().InputItem = 1;
+}
+
+Status ReplaceCombinations(CGlobalKvf& root, const std::vector<std::string>& names) {
+    if (names.empty())
+        return Status::Ok();
+    std::vector<std::unique_ptr<CDieCombinationKvf>> combinations;
+    for (const std::string& name : names) {
+        DieCombination found;
+        if (Status status = FindCombination(name, root.DefineEVS().SelectionMethod, &found);
+            !status)
+            return status;
+        combinations.push_back(std::make_unique<CDieCombinationKvf>(found));
+    }
+    root.Distributions().Combinations = std::move(combinations);
+    return Status::Ok();
+}
+
+Status ReplacePeriods(CAnalysisKvf& analysis, const std::optional<std::string>& periods) {
+    if (!periods)
+        return Status::Ok();
+    const std::optional<std::vector<double>> numbers = ParseNumberList(*periods);
+    if (!numbers)
+        return Status::InputFault(FormatText(kTextCliBadValue, std::string("--periods"), *periods,
+                                             std::string(Text(kTextCliExpectNumbers))));
+    analysis.EvaluatedReturnPeriods = *numbers;
+    return Status::Ok();
+}
+
+std::string KindName(int selectionMethod) {
+    return std::string(
+        Text(selectionMethod == 0 ? kTextCliAnnualMaxima : kTextCliPartialDurations));
+}
+
+} // namespace
+
+Status ApplyArguments(CGlobalKvf& root, const CaseArguments& arguments,
+                      const std::string& callerDirectory) {
+    Status status = Assign(root, arguments, false, callerDirectory);
+    if (status)
+        ChooseFirstItems(root, arguments);
+    if (status)
+        status = ReplaceCombinations(root, arguments.fits);
+    if (status)
+        status = ReplacePeriods(root.Analysis(), arguments.periods);
+    if (status)
+        status = Assign(root, arguments, true, callerDirectory);
+    return status;
+}
+
+Status FindCombination(const std::string& name, int selectionMethod, DieCombination* combination) {
+    if (const std::optional<DieCombination> found = CombinationOfName(name, selectionMethod)) {
+        *combination = *found;
+        return Status::Ok();
+    }
+    const int otherMethod = selectionMethod == 0 ? 1 : 0;
+    const std::string offered = JoinNames(GeneratedNames(selectionMethod));
+    if (CombinationOfName(name, otherMethod))
+        return Status::InputFault(FormatText(kTextCliNameOfOtherKind, name, KindName(otherMethod),
+                                             KindName(selectionMethod), offered));
+    return Status::InputFault(
+        FormatText(kTextCliUnknownCombination, name, KindName(selectionMethod), offered));
+}
+
+} // namespace ryn::cli

@@ -1,0 +1,70 @@
+#pragma once
+
+#include <chrono>
+#include <string>
+#include <vector>
+
+#include "apps/cli/console.h"
+#include "ports/ports.h"
+
+namespace ryn::cli {
+
+/// A terminal's line that shows how far long work has come: nothing in the first second, nothing
+/// where standard error is no terminal, and the line is gone afterwards.
+class ProgressLine final : public ProgressPort {
+  public:
+    explicit ProgressLine(Console& shownOn);
+    ~ProgressLine() override;
+    ProgressLine(const ProgressLine&) = delete;
+    ProgressLine& operator=(const ProgressLine&) = delete;
+
+    void ShowProgress(long long done, long long total) override;
+    /// Takes the line away, before something else is written there.
+    void Clear();
+
+  private:
+    Console& console;
+    std::chrono::steady_clock::time_point start = std::chrono::steady_clock::now();
+    int shownPercent = -1;
+};
+
+/// The command line's answers to a document's ports: messages go to standard error, questions are
+/// answered by --yes, missing years are kept for the command to print, no file is chosen.
+class ConsolePorts final : public MessagePort,
+                           public MissingYearsPort,
+                           public FileChoicePort,
+                           public KeyboardFocusPort,
+                           public RecentFilesPort,
+                           public ApplicationPort {
+  public:
+    ConsolePorts(Console& shownOn, Consent answerToQuestions);
+    ConsolePorts(const ConsolePorts&) = delete;
+    ConsolePorts& operator=(const ConsolePorts&) = delete;
+
+    operator const Ports&() const { return ports; }
+
+    /// Every message so far, as it was given.
+    const std::vector<std::string>& Messages() const { return messages; }
+    const std::vector<int>& MissingYears() const { return missingYears; }
+    /// Whether a message with this text was shown.
+    bool HasShown(const std::string& text) const;
+
+    void Show(MessageKind kind, const std::string& text) override;
+    Answer AskYesNo(const std::string& question) override;
+    Answer AskYesNoCancel(const std::string& question) override { return AskYesNo(question); }
+    void ShowMissingYears(const std::vector<int>& years) override { missingYears = years; }
+    std::optional<std::string> ChooseFileToSave(const SaveRequest& request) override;
+    void ReleaseFocus() override {}
+    void AddRecentFile(const std::string& /*path*/) override {}
+    std::string ApplicationName() override { return "ryn"; }
+
+  private:
+    Console& console;
+    Consent consent;
+    ProgressLine progress;
+    std::vector<std::string> messages;
+    std::vector<int> missingYears;
+    Ports ports;
+};
+
+} // namespace ryn::cli

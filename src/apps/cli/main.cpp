@@ -1,0 +1,38 @@
+#include <cerrno>
+#include <csignal>
+#include <cstring>
+#include <iostream>
+#include <string>
+#include <unistd.h>
+#include <vector>
+
+#include "apps/cli/descriptor_output.h"
+#include "apps/cli/run_ryn.h"
+#include "strings/catalogue.h"
+
+namespace {
+
+/// What the exit code becomes when standard output failed. A reader that has seen enough (`| head`)
+/// is no failure.
+int AfterOutput(int exitCode, int outputError, ryn::cli::Console& console) {
+    if (outputError == 0 || outputError == EPIPE)
+        return exitCode;
+    ryn::cli::ShowError(console, ryn::FormatText(ryn::kTextCliOutputFailed,
+                                                 std::string(std::strerror(outputError))));
+    return ryn::cli::kExitSystem;
+}
+
+} // namespace
+
+int main(int argumentCount, char** arguments) {
+    // A reader that goes away must not end the program in the middle of making a file.
+    std::signal(SIGPIPE, SIG_IGN);
+    ryn::cli::DescriptorOutput buffer(STDOUT_FILENO);
+    std::ostream out(&buffer);
+    ryn::cli::Console console{out, std::cerr, std::cin, ::isatty(STDERR_FILENO) != 0};
+    const std::vector<std::string> given(arguments + (argumentCount > 0 ? 1 : 0),
+                                         arguments + argumentCount);
+    const int exitCode = ryn::cli::RunRyn(given, console);
+    out.flush();
+    return AfterOutput(exitCode, buffer.Error(), console);
+}

@@ -1,0 +1,21 @@
+#pragma once
+
+#include <string>
+
+#include "apps/cli/case_arguments.h"
+#include "apps/cli/command_line.h"
+#include "apps/cli/console.h"
+
+namespace ryn::cli {
+
+/// `ryn new`: makes the parameter file of an analysis.
+struct NewOptions {
+    std::string file; ///< named .ryn or .RYN; saved as .RYN
+    CaseArguments arguments;
+    Consent consent = Consent::NotGiven;
+};
+
+int RunNew(const NewOptions& options, Console& console);
+void AddNewCommand(CommandLine& line);
+
+} // namespace ryn::cli
