@@ -10,6 +10,7 @@
 #include "import/netcdf_series.h"
 #include "import/read_rows.h"
 #include "import/sample_order.h"
+#include "import/table_text.h"
 #include "import/write_series.h"
 
 namespace ryn {
@@ -58,12 +59,22 @@ Status ReadPlainTable(TextSource& source, const ImportSettings& settings, TableS
     return status;
 }
 
+Status NoValues(const std::string& source, const ImportReport& report) {
+    std::string codes;
+    for (const OccurredText& code : report.missing)
+        if (code.count > 0)
+            codes += (codes.empty() ? ": " : ", ") + Quoted(code.text) + " " +
+                     std::to_string(code.count) + " times";
+    return Status::InputFault(source + ": none of its " + std::to_string(report.rowsRead) +
+                              " rows has a value in every chosen item" +
+                              (codes.empty() ? "" : "; taken for missing" + codes));
+}
+
 Status Finish(const std::string& source, const ImportSettings& settings, TableSamples* samples,
               ImportReport* report) {
     DropMissing(samples, report);
     if (samples->Count() == 0)
-        return Status::InputFault(
-            source + ": no row has a value: " + std::to_string(report->rowsRead) + " were read");
+        return NoValues(source, *report);
     return OrderSamples(source, settings.order, settings.duplicates, samples, report);
 }
 

@@ -57,7 +57,7 @@ void AddItems(const ImportReport& report, Lines* lines) {
     for (const ImportedItem& item : report.items) {
         std::string text = "item: " + Quoted(item.name);
         if (!item.column.empty())
-            text += " from column " + item.column;
+            text += (report.form == "table" ? " from column " : " from item ") + item.column;
         text += item.unit.empty() ? ", no unit known (--unit gives one)" : ", unit " + item.unit;
         lines->push_back(text);
     }

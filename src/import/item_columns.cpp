@@ -99,23 +99,38 @@ bool IsCounter(const ColumnValues& column) {
     return static_cast<double>(steps) >= 0.95 * static_cast<double>(column.values.size() - 1);
 }
 
+/// How likely a column of numbers is what somebody wants to analyse.
+enum class Standing {
+    Measured,
+    NamedAsTime,  ///< "Min" may be a minimum
+    NamedAsLabel, ///< "obs" may be an observation
+    Unchanging,   ///< a station's number, a counter
+};
+
+Standing StandingOf(const SampleRows& rows, std::size_t column) {
+    const ColumnValues values = ValuesOf(rows, column);
+    const std::string& name = rows.Column(column).name;
+    if (IsConstantLabel(values) || IsCounter(values))
+        return Standing::Unchanging;
+    if (IsLabelName(name))
+        return Standing::NamedAsLabel;
+    return IsTimeName(name) ? Standing::NamedAsTime : Standing::Measured;
+}
+
+/// The first column of the best standing.
 std::optional<std::size_t> FirstMeasurement(const SampleRows& rows, const TableLayout& layout) {
-    // Taken when nothing better is there: "Min" may be a minimum, a constant may be measured.
-    std::optional<std::size_t> namedAsTime;
-    std::optional<std::size_t> constant;
+    std::optional<std::size_t> best;
+    Standing standing = Standing::Unchanging;
     for (std::size_t i = 0; i < layout.columns.size(); ++i) {
-        const ColumnLayout& column = layout.columns[i];
-        if (column.kind != ColumnKind::Number || IsTimeColumn(layout, i) ||
-            IsLabelName(column.name))
+        if (layout.columns[i].kind != ColumnKind::Number || IsTimeColumn(layout, i))
             continue;
-        const ColumnValues values = ValuesOf(rows, i);
-        const bool varies = !IsConstantLabel(values) && !IsCounter(values);
-        if (varies && !IsTimeName(column.name))
-            return i;
-        std::optional<std::size_t>& second = varies ? namedAsTime : constant;
-        second = second.value_or(i);
+        const Standing found = StandingOf(rows, i);
+        if (best && found >= standing)
+            continue;
+        best = i;
+        standing = found;
     }
-    return namedAsTime ? namedAsTime : constant;
+    return best;
 }
 
 Status ChooseNamed(const ImportSettings& settings, TableLayout* layout) {
@@ -156,8 +171,9 @@ std::vector<std::size_t> OtherItems(const TableLayout& layout) {
             std::find(layout.items.begin(), layout.items.end(), i) != layout.items.end();
         const bool isOffered = column.kind == ColumnKind::Number ||
                                (column.kind == ColumnKind::Empty && !column.name.empty());
-        if (isOffered && !isChosen && !IsTimeColumn(layout, i) && !IsTimeName(column.name) &&
-            !IsLabelName(column.name))
+        const bool isAside = IsTimeColumn(layout, i) || IsLabelName(column.name) ||
+                             (IsTimeName(column.name) && !IsMinuteName(column.name));
+        if (isOffered && !isChosen && !isAside)
             others.push_back(i);
     }
     return others;

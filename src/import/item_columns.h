@@ -2,8 +2,8 @@
 
 #include "base/status.h"
 #include "import/import_options.h"
+#include "import/sample_rows.h"
 #include "import/table_layout.h"
-#include "import/time_columns.h"
 
 namespace ryn {
 

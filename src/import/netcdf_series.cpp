@@ -96,8 +96,9 @@ Status ChooseNamed(const std::string& path, const std::vector<std::string>& name
         if (!item)
             return Status::InputFault(path + ": --item " + Quoted(name) + ": no such item");
         if (InfoOf(header, *item).size != 1)
-            return Status::InputFault(path + ": item " + ItemTitle(header, *item) +
-                                      " is a grid; import takes series of one place");
+            return Status::InputFault(
+                path + ": item " + ItemTitle(header, *item) +
+                " has values at many places; import takes series of one place");
         if (std::find(chosen->begin(), chosen->end(), *item) != chosen->end())
             return Status::InputFault(path + ": --item " + Quoted(name) + " names an item twice");
         chosen->push_back(*item);
@@ -118,8 +119,8 @@ Status ChooseItems(const std::string& path, const ImportSettings& settings, TsqH
             report->otherItems.push_back(ItemTitle(header, i));
     }
     if (chosen->empty())
-        return Status::InputFault(path + ": is a grid: every item has spatial extent; import takes "
-                                         "series of one place");
+        return Status::InputFault(path + ": every item has values at many places (a grid, or "
+                                         "stations); import takes series of one place");
     return Status::Ok();
 }
 

@@ -100,7 +100,8 @@ std::optional<TimeRole> RoleOfWord(std::string_view word) {
 
 std::optional<TimeRole> RoleOfName(const std::string& name) {
     const std::vector<std::string> words = Words(name);
-    if (words.empty())
+    // "H2" and "S1" are no times.
+    if (words.empty() || name.find_first_of("0123456789") != std::string::npos)
         return std::nullopt;
     const bool hasYear = std::find(words.begin(), words.end(), "year") != words.end();
     const bool hasDay = std::find(words.begin(), words.end(), "day") != words.end();
@@ -132,6 +133,10 @@ std::vector<std::optional<TimeRole>> RolesOfNames(const std::vector<ColumnLayout
         roles.push_back(role);
     }
     return roles;
+}
+
+bool IsMinuteName(const std::string& name) {
+    return RoleOfName(name) == TimeRole::Minute || Lowercase(name) == "mm";
 }
 
 bool IsTimeName(const std::string& name) {

@@ -16,6 +16,9 @@ std::optional<TimeRole> RoleOfName(const std::string& name);
 /// role that occurs twice keeps its first column.
 std::vector<std::optional<TimeRole>> RolesOfNames(const std::vector<ColumnLayout>& columns);
 
+/// A name for minutes behind a column of hours, "mm" included.
+bool IsMinuteName(const std::string& name);
+
 /// True for the name of a column that holds a time, whatever its values ("date", "peak_tm").
 bool IsTimeName(const std::string& name);
 

@@ -1,0 +1,119 @@
+#include "import/table_text.h"
+#include "import/time_names.h"
+#include "import/time_search.h"
+
+namespace ryn {
+
+namespace {
+
+/// The forms that read most rows of a column: one row that only some forms read decides against the
+/// others.
+std::vector<DateForm> FittingForms(const SampleRows& rows, std::size_t column,
+                                   const std::vector<DateForm>& forms) {
+    std::vector<DateForm> fitting;
+    double most = 0.0;
+    for (const DateForm form : forms) {
+        const TimeFit fit = FitTime(rows, DateLayout(column, form));
+        if (!fit.IsGood() || fit.ok < most)
+            continue;
+        if (fit.ok > most)
+            fitting.clear();
+        most = fit.ok;
+        fitting.push_back(form);
+    }
+    return fitting;
+}
+
+std::vector<DateForm> FormsOfNumbers(const SampleRows& rows, std::size_t column) {
+    bool isDigits = false;
+    for (const std::size_t size : {8, 10, 12, 14})
+        isDigits = isDigits || rows.HasDigitsOnly(column, size);
+    if (!isDigits)
+        return {};
+    std::vector<DateForm> forms =
+        FittingForms(rows, column, {DateForm::Compact, DateForm::CompactDayFirst});
+    // The year stands first wherever it can: 20011210 is no day 20 of month 1.
+    forms.resize(std::min<std::size_t>(forms.size(), 1));
+    return forms;
+}
+
+std::vector<DateForm> FormsOfTexts(const SampleRows& rows, std::size_t column) {
+    std::vector<DateForm> forms =
+        FittingForms(rows, column,
+                     {DateForm::YearMonthDay, DateForm::DayMonthYear, DateForm::MonthDayYear,
+                      DateForm::ShortYearMonthDay});
+    if (forms.empty())
+        forms = FittingForms(rows, column, {DateForm::Compact});
+    // Nobody writes the month first with points between.
+    const std::string_view first = rows.All().front()[column];
+    if (forms.size() > 1 && std::count(first.begin(), first.end(), '.') >= 2)
+        forms.resize(1);
+    return forms;
+}
+
+/// The role that a column can play as the time of day beside a date: clock times, or numbers under
+/// a name for one.
+std::optional<TimeRole> ClockRole(const TimeSearch& search, std::size_t column) {
+    const ColumnLayout& layout = search.rows.Column(column);
+    if (layout.kind == ColumnKind::Time && search.IsUsable(column, TimeRole::Clock))
+        return TimeRole::Clock;
+    const std::vector<std::string> words = Words(layout.name);
+    const bool isNamed =
+        RoleOfName(layout.name) == TimeRole::Hour ||
+        (!words.empty() &&
+         IsOneOf(words.back(), {"time", "tm", "zeit", "uhrzeit", "tijd", "heure", "hora", "hhmm"}));
+    if (!isNamed || layout.kind != ColumnKind::Number)
+        return std::nullopt;
+    for (const TimeRole role : {TimeRole::Hour, TimeRole::HourMinute})
+        if (search.IsUsable(column, role))
+            return role;
+    return std::nullopt;
+}
+
+void AddClock(const TimeSearch& search, TimeLayout* time) {
+    const std::size_t date = time->columns[0].column;
+    for (const std::size_t column : search.columns) {
+        const std::optional<TimeRole> role =
+            column == date ? std::nullopt : ClockRole(search, column);
+        if (!role)
+            continue;
+        time->columns.push_back({column, *role});
+        const std::size_t next = column + 1;
+        if (role == TimeRole::Hour && search.Contains(next) &&
+            IsMinuteName(search.rows.Column(next).name) && search.IsUsable(next, TimeRole::Minute))
+            time->columns.push_back({next, TimeRole::Minute});
+        return;
+    }
+}
+
+/// A column of zone names ("EST", "EDT") beside the time.
+void AddZone(const TimeSearch& search, TimeLayout* time) {
+    const std::size_t column = time->columns.back().column + 1;
+    if (!search.Contains(column) || search.rows.Column(column).kind != ColumnKind::Text)
+        return;
+    TimeLayout probe = *time;
+    probe.columns.push_back({column, TimeRole::Zone});
+    if (FitTime(search.rows, probe).IsGood())
+        *time = probe;
+}
+
+} // namespace
+
+bool FindDateColumn(const TimeSearch& search, TimeLayout* time) {
+    for (const std::size_t column : search.columns) {
+        const bool isNumber = search.rows.Column(column).kind == ColumnKind::Number;
+        const std::vector<DateForm> forms =
+            isNumber ? FormsOfNumbers(search.rows, column) : FormsOfTexts(search.rows, column);
+        if (forms.empty())
+            continue;
+        *time = DateLayout(column, forms[0]);
+        time->rivals.assign(forms.begin() + 1, forms.end());
+        if (FitTime(search.rows, *time).withClock == 0.0)
+            AddClock(search, time);
+        AddZone(search, time);
+        return true;
+    }
+    return false;
+}
+
+} // namespace ryn
