@@ -49,8 +49,9 @@ Status ReplaceCombinations(CGlobalKvf& root, const std::vector<std::string>& nam
     std::vector<std::unique_ptr<CDieCombinationKvf>> combinations;
     for (const std::string& name : names) {
         DieCombination found;
-        if (Status status = FindCombination(name, root.DefineEVS().SelectionMethod, &found);
-            !status)
+        const CombinationQuery query{name, root.DefineEVS().SelectionMethod,
+                                     "DefineEVS.SelectionMethod"};
+        if (Status status = FindCombination(query, &found); !status)
             return status;
         combinations.push_back(std::make_unique<CDieCombinationKvf>(found));
     }
@@ -90,18 +91,19 @@ Status ApplyArguments(CGlobalKvf& root, const CaseArguments& arguments,
     return status;
 }
 
-Status FindCombination(const std::string& name, int selectionMethod, DieCombination* combination) {
-    if (const std::optional<DieCombination> found = CombinationOfName(name, selectionMethod)) {
+Status FindCombination(const CombinationQuery& query, DieCombination* combination) {
+    if (const auto found = CombinationOfName(query.name, query.selectionMethod)) {
         *combination = *found;
         return Status::Ok();
     }
-    const int otherMethod = selectionMethod == 0 ? 1 : 0;
-    const std::string offered = JoinNames(GeneratedNames(selectionMethod));
-    if (CombinationOfName(name, otherMethod))
-        return Status::InputFault(FormatText(kTextCliNameOfOtherKind, name, KindName(otherMethod),
-                                             KindName(selectionMethod), offered));
+    const int otherMethod = query.selectionMethod == 0 ? 1 : 0;
+    const std::string kind = KindName(query.selectionMethod);
+    const std::string offered = JoinNames(GeneratedNames(query.selectionMethod));
     return Status::InputFault(
-        FormatText(kTextCliUnknownCombination, name, KindName(selectionMethod), offered));
+        CombinationOfName(query.name, otherMethod)
+            ? FormatText(kTextCliNameOfOtherKind, query.name, KindName(otherMethod), kind,
+                         query.decidedBy, offered)
+            : FormatText(kTextCliUnknownCombination, query.name, kind, offered));
 }
 
 } // namespace ryn::cli

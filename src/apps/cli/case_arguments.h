@@ -25,8 +25,14 @@ struct CaseArguments {
 Status ApplyArguments(CGlobalKvf& root, const CaseArguments& arguments,
                       const std::string& callerDirectory);
 
-/// The combination of a generated name for a kind of series (0 annual maxima, 1 partial
-/// durations). A fault says of which kind the name is and lists the names on offer.
-Status FindCombination(const std::string& name, int selectionMethod, DieCombination* combination);
+/// A combination looked for by its generated name.
+struct CombinationQuery {
+    std::string name;
+    int selectionMethod = 0; ///< 0 annual maxima, 1 partial durations
+    std::string decidedBy;   ///< what the user can change to have the other kind
+};
+
+/// A fault says of which kind the name is and lists the names on offer.
+Status FindCombination(const CombinationQuery& query, DieCombination* combination);
 
 } // namespace ryn::cli

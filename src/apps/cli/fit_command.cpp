@@ -105,7 +105,8 @@ Status ReadValues(const FitOptions& options, Console& console, std::vector<doubl
 
 Status MakeTask(const FitOptions& options, Console& console, FitTask* task) {
     DieCombination found;
-    Status status = FindCombination(options.name, options.partialDurations ? 1 : 0, &found);
+    Status status =
+        FindCombination({options.name, options.partialDurations ? 1 : 0, "--pds"}, &found);
     task->combination = CombinationOf(found);
     task->name = found.ItemName;
     if (status)

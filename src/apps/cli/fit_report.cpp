@@ -32,38 +32,48 @@ Json JsonOfQuantile(const FitQuantile& quantile) {
             {"standardDeviation", nullptr}};
 }
 
-void PrintParameters(std::ostream& out, const stats::FittedModel& model) {
+/// "-" stands for a number that there is none of, such as the likelihood of a fit that leaves a
+/// value outside its range.
+std::string NumberText(double value) {
     constexpr int kDigits = 6;
+    return std::isfinite(value) ? FixedText(value, DecimalsFor(value, kDigits)) : "-";
+}
+
+void PrintParameters(std::ostream& out, const stats::FittedModel& model) {
     TextTable table({Alignment::Left, Alignment::Right});
     for (const stats::Parameter& parameter : model.parameters)
-        table.AddRow({std::string(parameter.symbol),
-                      FixedText(parameter.value, DecimalsFor(parameter.value, kDigits))});
-    table.AddRow({TextOf(kTextCliLogLikelihood),
-                  FixedText(model.logLikelihood, DecimalsFor(model.logLikelihood, kDigits))});
+        table.AddRow({std::string(parameter.symbol), NumberText(parameter.value)});
+    table.AddRow({TextOf(kTextCliLogLikelihood), NumberText(model.logLikelihood)});
     table.Print(out);
 }
 
-/// One number of decimals for the whole column, so that its points stand below each other: what
-/// the smallest estimate needs for five digits.
-int ColumnDecimals(const std::vector<FitQuantile>& quantiles) {
-    constexpr int kDigits = 5;
+/// One number of decimals for a whole column, so that its points stand below each other: what the
+/// smallest number needs for so many digits.
+int ColumnDecimals(const std::vector<double>& numbers, int digits) {
     int decimals = 0;
-    for (const FitQuantile& quantile : quantiles)
-        decimals = std::max(decimals, DecimalsFor(quantile.estimate, kDigits));
+    for (const double number : numbers)
+        decimals = std::max(decimals, DecimalsFor(number, digits));
     return decimals;
 }
 
 void PrintQuantiles(std::ostream& out, const std::vector<FitQuantile>& quantiles) {
-    constexpr int kProbabilityDigits = 4;
-    const int decimals = ColumnDecimals(quantiles);
+    constexpr int kProbabilityDigits = 3;
+    constexpr int kEstimateDigits = 5;
+    std::vector<double> probabilities;
+    std::vector<double> estimates;
+    for (const FitQuantile& quantile : quantiles) {
+        probabilities.push_back(quantile.exceedance);
+        estimates.push_back(quantile.estimate);
+    }
+    const int probabilityDecimals = ColumnDecimals(probabilities, kProbabilityDigits);
+    const int estimateDecimals = ColumnDecimals(estimates, kEstimateDigits);
     TextTable table({Alignment::Right, Alignment::Right, Alignment::Right});
     table.AddRow(
         {TextOf(kTextCliReturnPeriod), TextOf(kTextCliExceedance), TextOf(kTextCliEstimate)});
     for (const FitQuantile& quantile : quantiles)
-        table.AddRow(
-            {ShortestText(quantile.period),
-             FixedText(quantile.exceedance, DecimalsFor(quantile.exceedance, kProbabilityDigits)),
-             FixedText(quantile.estimate, decimals)});
+        table.AddRow({ShortestText(quantile.period),
+                      FixedText(quantile.exceedance, probabilityDecimals),
+                      FixedText(quantile.estimate, estimateDecimals)});
     table.Print(out);
 }
 

@@ -1,6 +1,7 @@
 #include <cerrno>
 #include <csignal>
 #include <cstring>
+#include <fcntl.h>
 #include <iostream>
 #include <string>
 #include <unistd.h>
@@ -11,6 +12,17 @@
 #include "strings/catalogue.h"
 
 namespace {
+
+/// Takes the places of standard streams that the caller closed, so that no file that a command
+/// opens gets the number of one and is written into. Writing to such a stream still fails.
+void FillClosedStreams() {
+    int fd = 0;
+    do
+        fd = ::open("/dev/null", O_RDONLY);
+    while (fd >= 0 && fd <= STDERR_FILENO);
+    if (fd > STDERR_FILENO)
+        ::close(fd);
+}
 
 /// What the exit code becomes when standard output failed. A reader that has seen enough (`| head`)
 /// is no failure.
@@ -25,6 +37,7 @@ int AfterOutput(int exitCode, int outputError, ryn::cli::Console& console) {
 } // namespace
 
 int main(int argumentCount, char** arguments) {
+    FillClosedStreams();
     // A reader that goes away must not end the program in the middle of making a file.
     std::signal(SIGPIPE, SIG_IGN);
     ryn::cli::DescriptorOutput buffer(STDOUT_FILENO);
