@@ -72,6 +72,7 @@ struct UnitParts {
 
 UnitParts SplitUnits(std::string_view units) {
     const std::string lower = Lower(units);
+    // UDUNITS takes all of these.
     for (const std::string_view word : {" since ", " after ", " from ", " ref ", " @ "})
         if (const std::size_t place = lower.find(word); place != std::string::npos)
             return {Trimmed(units.substr(0, place)), Trimmed(units.substr(place + word.size()))};
@@ -104,6 +105,7 @@ Status CfTime::Parse(std::string_view units, std::string_view calendarName, CfTi
     }
     time.unitName = parts.unit;
     time.millisecondsInUnit = unit->milliseconds;
+    // Without a date there is no calendar to count months by.
     time.monthsInUnit = time.reference ? unit->months : 0;
     time.calendar = *calendar;
     *result = std::move(time);
@@ -118,6 +120,7 @@ std::int64_t CfTime::AddMonths(std::int64_t months) const {
     const std::int64_t total = date.year * 12 + date.month - 1 + months;
     date.year = total / 12 - (total % 12 < 0 ? 1 : 0);
     date.month = static_cast<int>(total - date.year * 12) + 1;
+    // A month after 31 January is the last day of February.
     date.day = std::min(date.day, DaysInMonth(calendar, date.year, date.month));
     return DayNumber(calendar, date) * kMillisecondsPerDay + *reference - day * kMillisecondsPerDay;
 }

@@ -96,6 +96,9 @@ std::uint64_t SaturatingSum(std::uint64_t a, std::uint64_t b) {
     return __builtin_add_overflow(a, b, &sum) ? UINT64_MAX : sum;
 }
 
+/// Walks the header in the order of the specification's grammar: number of records, dimensions,
+/// attributes of the file, variables with theirs. No count is used before it was tested, so that
+/// neither time nor memory grows beyond what the file's size allows.
 class ClassicHeader {
   public:
     ClassicHeader(Cursor* source, int formatVersion)
@@ -209,6 +212,7 @@ class ClassicHeader {
     void CheckExtents() {
         if (!cursor.Good())
             return;
+        // The last record needs no filling behind it, so that the exact sizes count.
         const std::uint64_t recordBytes = RecordBytes();
         for (const Variable& variable : variables) {
             if (variable.hasRecords && records == 0)

@@ -37,6 +37,7 @@ int LibraryId(int variable) {
     return variable == kNcGlobal ? NC_GLOBAL : variable;
 }
 
+/// A netCDF-4 text attribute is a list of strings, mostly of one.
 std::string FirstString(int handle, int variable, const std::string& name, std::size_t length) {
     std::vector<char*> texts(length, nullptr);
     std::string first;
@@ -147,6 +148,7 @@ Status NcFile::ReadVariable(int id) {
                         name.data(),
                         static_cast<NcType>(std::min(type, static_cast<int>(NcType::String))),
                         {places.begin(), places.begin() + count}};
+    // A forged file may name dimensions that the root group does not have.
     const auto exists = [&](int place) {
         return place >= 0 && static_cast<std::size_t>(place) < dimensions.size();
     };
@@ -175,6 +177,7 @@ std::optional<std::string> NcFile::Text(int variable, const std::string& name) c
     std::string text(length, '\0');
     if (nc_get_att_text(handle, id, name.c_str(), text.data()) != NC_NOERR)
         return std::nullopt;
+    // C programs often store the terminating NUL with the text.
     text.erase(text.find_last_not_of('\0') + 1);
     return text;
 }

@@ -32,6 +32,7 @@ NcWriter::NcWriter(const std::string& path, std::string shownPath, NcFormat form
 }
 
 NcWriter::~NcWriter() {
+    // Not finished: what was written is thrown away with the temporary file.
     if (handle == kClosed)
         return;
     const auto lock = LockNetcdf();

@@ -40,6 +40,8 @@ std::size_t LargestVariable(const TsqContent& content) {
     return bytes;
 }
 
+/// Definitions first, then values: classic netCDF has its header in front, and opening it again
+/// would move everything behind it.
 class Encoder {
   public:
     Encoder(const TsqContent& source, NcWriter* target)
@@ -126,6 +128,7 @@ class Encoder {
         PutDescription(latitude, "latitude", "degrees_north");
     }
 
+    /// Items of the same grid share their axes.
     const Plane* FindPlane(const TsqPlane& plane) const {
         const auto found = std::ranges::find(planes, plane, &Plane::plane);
         return found != planes.end() ? &*found : nullptr;
@@ -216,6 +219,7 @@ class Encoder {
 
     void WriteTimes() {
         const double milliseconds = MillisecondsInUnit(header.axis.unit);
+        // Equidistant times exist nowhere, and are not all made at once.
         std::vector<double> block(std::min(steps, kBlock));
         for (std::size_t first = 0; first < steps && out.Good(); first += kBlock) {
             const std::size_t size = std::min(kBlock, steps - first);
@@ -249,6 +253,8 @@ class Encoder {
         out.Write(latitude, start, size, header.coordinates.latitudes.data());
     }
 
+    /// Each item as one block. Without steps there is nothing to write: an empty block of the
+    /// record dimension is an error to the library.
     void WriteItems() {
         const std::array<std::size_t, 3> start{};
         for (std::size_t i = 0; i < items.size() && steps > 0; ++i) {

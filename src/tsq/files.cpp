@@ -41,7 +41,7 @@ Status OpenInMemory(const std::string& path, TsqHeader* header,
     return Status::Ok();
 }
 
-/// Reads every step of a file into memory.
+/// Reads every step of a file into memory, in any order of steps: copying judges nothing.
 Status Load(const std::string& path, TsqContent* content) {
     std::unique_ptr<StepSource> source;
     if (Status status = OpenNetcdf(path, TimeOrder::Any, &content->header, &source); !status)
@@ -91,6 +91,7 @@ int OpenForReading(const std::string& path, TimeOrder order, TsqHeaderHandle* he
                    TsqFileHandle* file) try {
     TsqHeaderHandle readHeader(new TsqHeader);
     std::unique_ptr<StepSource> source;
+    // Memory files are known by their absolute path; disk files keep the name that messages show.
     const std::string full = FullPath(path);
     const Status status = MemoryStore::Instance().Covers(full)
                               ? OpenInMemory(full, readHeader.get(), &source)
@@ -170,6 +171,8 @@ int tsqWriteItemTimeStep(TsqHeader* header, TsqFile* file, double time, const fl
 int tsqFileClose(TsqHeader* /*header*/, TsqFileHandle* file) {
     if (file == nullptr || *file == nullptr)
         return 0;
+    // The handle is empty from here on, also after a failure: nothing can be saved by closing
+    // twice.
     const TsqFileHandle closed = std::move(*file);
     if (!closed->writer)
         return 0;

@@ -75,11 +75,13 @@ Status MemoryStore::Put(const std::string& path, TsqContent content) {
     return Put(path, std::make_shared<const TsqContent>(std::move(content)));
 }
 
+// The directory may have gone between making a file and closing it; a file that nobody would remove
+// must not be left.
 Status MemoryStore::Put(const std::string& path, File file) {
     const std::lock_guard lock(mutex);
     if (!directories.contains(DirectoryOf(path)))
         return Status::SystemFault(path + ": the directory in memory is gone");
-    files[path].swap(file);
+    files[path].swap(file); // the old file is freed by the caller, outside the lock
     return Status::Ok();
 }
 

@@ -56,6 +56,7 @@ Status NetcdfSource::LoadTimes(std::size_t step, StepBlock<double>* block) {
 }
 
 std::size_t NetcdfSource::StepsAt(const ItemColumn& column, std::size_t step) const {
+    // Where time is not the slowest dimension, several steps would come interleaved.
     const std::size_t wanted =
         column.isStepwise ? std::max<std::size_t>(1, kBlock / column.cells) : 1;
     return std::min(wanted, count - step);
@@ -65,6 +66,7 @@ Status NetcdfSource::ReadItem(std::size_t item, std::size_t step, std::size_t st
                               float* values) {
     const ItemColumn& column = items[item];
     const NcVariable& variable = *column.variable;
+    // The library wants a place and a length for each dimension, those of length 1 included.
     std::vector<std::size_t> start(variable.dimensions.size(), 0);
     std::vector<std::size_t> size;
     for (std::size_t i = 0; i < variable.dimensions.size(); ++i)

@@ -53,6 +53,8 @@ std::int64_t FloorSeconds(std::int64_t milliseconds) {
     return milliseconds / kSecond - (milliseconds % kSecond < 0 ? 1 : 0);
 }
 
+/// One pass over a file's description. Ours and other programs' files go the same way; our
+/// attributes refine what the CF ones say, and give way where they no longer fit.
 class Opener {
   public:
     explicit Opener(TsqHeader* target) : header(*target) {}
@@ -107,6 +109,7 @@ class Opener {
         }
     }
 
+    /// Along the time dimension, whatever the time variable's other dimensions of length 1.
     std::size_t Steps() const {
         return file->Dimensions()[static_cast<std::size_t>(timeDimension)].length;
     }
@@ -144,6 +147,7 @@ class Opener {
         return true;
     }
 
+    /// Only such times can be read block by block as they stand.
     bool IsOurTime(const TsqAxis& axis, const CfTime& parsed) const {
         const bool isPlain = time->type == NcType::Double && time->dimensions.size() == 1 &&
                              !file->Number(time->id, "scale_factor") &&
@@ -178,6 +182,7 @@ class Opener {
         if (Status status = StoredTime(Steps() - 1, &last); !status)
             return status;
         const double ruled = static_cast<double>(Steps() - 1) * axis.step;
+        // A step of a third of a second was rounded to the millisecond when it was stored.
         const auto agree = [&](double stored, double fromStart) {
             const double apart = std::abs(stored - (axis.start + fromStart)) * milliseconds;
             return apart <= 1.0 + 1e-12 * std::abs(stored) * milliseconds;
@@ -221,6 +226,7 @@ class Opener {
                 for (std::string name; list >> name;)
                     names.insert(name);
             }
+        // A coordinate variable is named as its dimension.
         for (const NcDimension& dimension : file->Dimensions())
             names.insert(dimension.name);
         return names;
@@ -246,6 +252,7 @@ class Opener {
         const NcVariable& variable = *column->variable;
         TsqItem item;
         item.name = file->Text(variable.id, "long_name").value_or(isMarked ? "" : variable.name);
+        // The text decides: a code outside the table belonged to another process.
         const auto units = file->Text(variable.id, "units");
         item.unit = units ? UnitOfText(*units)
                           : IntOf(*file, variable.id, layout::kItemUnit).value_or(kUnitUndefined);
@@ -267,6 +274,7 @@ class Opener {
                 continue;
             ++item->dimensions;
             column->isStepwise = column->isStepwise && i > column->timePlace;
+            // A forged count: the reader refuses so many values when they are asked for.
             if (__builtin_mul_overflow(item->cells, length, &item->cells))
                 item->cells = std::numeric_limits<std::size_t>::max();
         }
@@ -288,6 +296,7 @@ class Opener {
     void SetForeignDeleteValue() {
         if (isMarked)
             return;
+        // One value for the whole file, while each item may have several marks of its own.
         const NcValues values(file.get(), columns.front().variable);
         const auto marks = values.MissingMarks();
         const auto isFloat = [](double mark) {

@@ -19,6 +19,7 @@ void StepReader::Rewind() {
 }
 
 bool StepReader::LoadTimes() {
+    // Emptied first, so that a block that was half filled is not read later.
     times.size = 0;
     failure = source->LoadTimes(step, &times);
     if (!failure)

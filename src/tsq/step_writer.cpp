@@ -42,6 +42,7 @@ bool StepWriter::Fail(const std::string& reason) {
 bool StepWriter::AppendTime(double time) {
     if (count >= static_cast<std::size_t>(INT_MAX))
         return Fail("a data file has at most 2147483647 time steps");
+    // The axis tells the times, and what callers pass may be absolute.
     if (content.header.axis.IsEquidistant())
         return true;
     if (!std::isfinite(time))
@@ -51,6 +52,7 @@ bool StepWriter::AppendTime(double time) {
 }
 
 void StepWriter::AppendPlane(const TsqItem& of, const float* values) {
+    // A hole in a result grid must look like one to other programs, which know the fill value.
     std::vector<float>& column = content.values[item];
     const auto first = static_cast<std::ptrdiff_t>(column.size());
     column.insert(column.end(), values, values + of.cells);

@@ -58,6 +58,7 @@ int UnitRegistry::CodeOf(std::string_view text) {
     const std::lock_guard lock(mutex);
     if (const auto known = codes.find(text); known != codes.end())
         return known->second;
+    // Both outcomes are remembered, since asking UDUNITS costs a hundred comparisons of units.
     int code = SameUnitInTable(text);
     if (code == kUnitUndefined) {
         code = kFirstInternedUnit + static_cast<int>(interned.size());
@@ -70,6 +71,7 @@ int UnitRegistry::CodeOf(std::string_view text) {
 const UnitConverter* UnitRegistry::ConverterFor(int from, int to) {
     const auto [place, isNew] = converters.try_emplace({from, to});
     if (isNew)
+        // That two units do not convert is remembered as well.
         place->second = Library().Converter(TextUnlocked(from), TextUnlocked(to));
     return place->second ? &*place->second : nullptr;
 }
