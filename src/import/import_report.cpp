@@ -142,7 +142,7 @@ std::string LineList(const std::vector<long>& lines, long count) {
 
 std::vector<std::string> ReportLines(const ImportReport& report) {
     Lines lines = {report.source + ": " + report.form};
-    if (report.form == "table")
+    if (report.form == "table" && !report.items.empty())
         AddLayout(report.layout, &lines);
     AddItems(report, &lines);
     AddMissing(report, &lines);

@@ -5,6 +5,7 @@
 
 #include "import/number_field.h"
 #include "import/table_text.h"
+#include "import/time_names.h"
 #include "import/unit_text.h"
 
 namespace ryn {
@@ -29,18 +30,21 @@ std::string WithoutBrackets(std::string_view text) {
     return std::string(Trimmed(text));
 }
 
-/// Most fields are units, brackets or nothing, and at least one is a unit.
-bool IsUnitLine(const Fields& fields) {
+/// Units, or something in brackets, above half of the columns of numbers at least; and no title of
+/// a date ("date,h" are names).
+bool IsUnitLine(const TableShape& shape, const Fields& fields) {
     std::size_t units = 0;
     std::size_t others = 0;
-    for (const std::string& field : fields) {
-        const std::string text = WithoutBrackets(field);
-        if (text.empty() || text == "-")
+    for (std::size_t i = 0; i < fields.size(); ++i) {
+        const std::string text = WithoutBrackets(fields[i]);
+        if (IsTimeName(text) && !RoleOfName(text))
+            return false;
+        if (text.empty() || text == "-" || shape.kinds[i] != ColumnKind::Number)
             continue;
-        const bool isBracketed = text.size() != field.size();
+        const bool isBracketed = text.size() != fields[i].size();
         (isBracketed || LooksLikeUnit(text) ? units : others) += 1;
     }
-    return units > 0 && units >= others * 2;
+    return units > 0 && units >= others;
 }
 
 /// Under the delimiter of blanks, the unit behind a name is a field of its own: "Q", "[m3/s]".
@@ -239,12 +243,13 @@ void FindNames(const TableShape& shape, std::size_t firstRow, TableLayout* layou
     std::vector<TitleLine> lines = LinesOfTitles(shape, firstRow);
     if (lines.empty())
         return;
-    // In a block with a line of units the names stand at its top; else they are the nearest line.
-    const auto unitLine = std::find_if(
-        lines.begin(), lines.end(), [](const TitleLine& line) { return IsUnitLine(line.fields); });
+    // The names stand above a line of units; without one they are the nearest line.
+    const auto unitLine = std::find_if(lines.begin(), lines.end(), [&shape](const TitleLine& line) {
+        return IsUnitLine(shape, line.fields);
+    });
     const bool hasUnits =
         unitLine != lines.end() && lines.size() > 1 && unitLine + 1 != lines.end();
-    const TitleLine& names = hasUnits ? lines.back() : lines.front();
+    const TitleLine& names = hasUnits ? *(unitLine + 1) : lines.front();
     layout->nameLine = names.line;
     for (std::size_t i = 0; i < shape.fieldCount; ++i)
         SetColumn(names.fields[i], &layout->columns[i]);

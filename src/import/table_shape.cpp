@@ -134,17 +134,25 @@ ColumnKind KindOfColumn(const std::vector<const HeadRow*>& rows, std::size_t col
     return counts[FieldKind::Time] >= kMost * present ? ColumnKind::Time : ColumnKind::Text;
 }
 
-/// The kinds of the columns by the later half of the rows of that size, which a header does not
-/// reach.
+/// The kinds of the columns by the last quarter of the rows of that size, which a header with numbers
+/// in it does not reach; where a column is empty there, by more of them.
 std::vector<ColumnKind> KindsOfColumns(const TableShape& shape) {
     std::vector<const HeadRow*> rows;
     for (const HeadRow& row : shape.rows)
-        if (!row.isComment && row.fields.size() == shape.fieldCount)
+        if (!row.isComment && !row.isDivider && row.fields.size() == shape.fieldCount &&
+            Explained(row, shape.decimal) > 0.0)
             rows.push_back(&row);
-    rows.erase(rows.begin(), rows.begin() + static_cast<std::ptrdiff_t>(rows.size() / 2));
-    std::vector<ColumnKind> kinds;
-    for (std::size_t column = 0; column < shape.fieldCount; ++column)
-        kinds.push_back(KindOfColumn(rows, column, shape.decimal));
+    std::reverse(rows.begin(), rows.end());
+    constexpr std::size_t kEnough = 5;
+    std::vector<ColumnKind> kinds(shape.fieldCount, ColumnKind::Empty);
+    for (const std::size_t part : {4, 2, 1}) {
+        const std::size_t count = std::min(rows.size(), std::max(kEnough, rows.size() / part));
+        const std::vector<const HeadRow*> last(rows.begin(),
+                                               rows.begin() + static_cast<std::ptrdiff_t>(count));
+        for (std::size_t column = 0; column < shape.fieldCount; ++column)
+            if (kinds[column] == ColumnKind::Empty)
+                kinds[column] = KindOfColumn(last, column, shape.decimal);
+    }
     return kinds;
 }
 

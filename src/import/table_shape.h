@@ -29,7 +29,7 @@ struct TableShape {
     char decimal = '.';
     std::vector<std::string> commentMarks;
     std::size_t fieldCount = 0;    ///< of most rows
-    std::vector<ColumnKind> kinds; ///< of its columns, by the later half of the rows
+    std::vector<ColumnKind> kinds; ///< of its columns, by the last of the rows
     std::vector<HeadRow> rows;
 };
 
