@@ -2,7 +2,6 @@
 
 #include <vector>
 
-#include "base/large_page_allocator.h"
 #include "base/ole_date_time.h"
 
 namespace ryn {
@@ -15,6 +14,6 @@ struct STSItem {
 };
 
 /// The samples of a series in file order.
-using SampleArray = std::vector<STSItem, LargePageAllocator<STSItem>>;
+using SampleArray = std::vector<STSItem>;
 
 } // namespace ryn
