@@ -1,5 +1,6 @@
 #include "apps/cli/date_text.h"
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 #include <utility>
@@ -16,7 +17,7 @@ class FixedFields {
     explicit FixedFields(std::string_view source) : text(source) {}
 
     int Number(std::size_t digits) {
-        const std::string_view field = text.substr(place, digits);
+        const std::string_view field = text.substr(std::min(place, text.size()), digits);
         place += digits;
         const bool plain = field.size() == digits &&
                            field.find_first_not_of("0123456789") == std::string_view::npos;

@@ -101,7 +101,7 @@ int RunExtract(const ExtractOptions& options, Console& console) {
         return refused;
     const std::vector<Setting> settings = SettingsOf(file.Root());
     const std::vector<std::string> before = ValuesOf(settings);
-    const ExtractionResult result = ExtractSeriesOf(file.Root(), file.OutsidePorts());
+    const ExtractionResult result = ExtractSeriesOf(file.Root());
     if (!result.status)
         return ReportRefusal(result.status, file, console, file.OutsidePorts());
     CBasicInputKvf& basic = file.Root().BasicInput();

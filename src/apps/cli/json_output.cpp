@@ -13,7 +13,18 @@ namespace {
 
 void PrintValue(std::ostream& out, const Json& value, const std::string& indent);
 
+/// The shortest text that reads back as the same double, which the library's own is not always;
+/// with a ".0" where it would read as a whole number.
+std::string DoubleText(double value) {
+    std::string text = ShortestText(value);
+    if (text.find_first_not_of("-0123456789") == std::string::npos)
+        text += ".0";
+    return text;
+}
+
 std::string Dumped(const Json& value) {
+    if (value.is_number_float())
+        return DoubleText(value.get<double>());
     return value.dump(-1, ' ', false, Json::error_handler_t::replace);
 }
 

@@ -89,9 +89,11 @@ Json JsonOfItem(const ItemExtent& extent) {
 Json JsonOfGap(const SeriesInfo& info) {
     if (!info.gapFrom.IsValid())
         return nullptr;
+    // Dates are to the second; their difference would show the rounding of day fractions.
+    const double seconds = (info.gapTo - info.gapFrom).GetTotalDays() * 86400.0;
     return {{"from", JsonOf(info.gapFrom)},
             {"to", JsonOf(info.gapTo)},
-            {"days", JsonOf((info.gapTo - info.gapFrom).GetTotalDays())}};
+            {"days", JsonOf(std::round(seconds) / 86400.0)}};
 }
 
 std::string TextOf(int id) {
