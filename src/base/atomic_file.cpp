@@ -4,6 +4,7 @@
 #include <cstdlib>
 #include <fcntl.h>
 #include <filesystem>
+#include <random>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -30,19 +31,30 @@ Status ResolveLinks(std::string* path) {
     return Status::FromErrno(*path, ELOOP);
 }
 
-mode_t NewFileMode() {
-    const mode_t mask = ::umask(0);
-    ::umask(mask);
-    return static_cast<mode_t>(0666) & ~mask;
+/// Makes a new file ".NAME.XXXXXX" beside the target, by the process's mask of permissions.
+int MakeBeside(const PathParts& parts, std::string* name) {
+    constexpr std::string_view kLetters = "abcdefghijklmnopqrstuvwxyz0123456789";
+    std::random_device random;
+    for (int attempt = 0; attempt < 100; ++attempt) {
+        // The name is cut so that the temporary one stays below the system's 255 bytes.
+        *name = parts.directory + "." + (parts.name + parts.extension).substr(0, 200) + ".";
+        for (int i = 0; i < 6; ++i)
+            name->push_back(kLetters[random() % kLetters.size()]);
+        const int fd = ::open(name->c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
+        if (fd >= 0 || errno != EEXIST)
+            return fd;
+    }
+    return -1;
 }
 
-Status FlushDirectory(const std::string& directory) {
+/// Makes a rename last. A directory that may be written but not read cannot be flushed, and some
+/// file systems refuse it; the data are safe either way.
+void FlushDirectory(const std::string& directory) {
     const int fd = ::open(directory.empty() ? "." : directory.c_str(), O_RDONLY | O_CLOEXEC);
     if (fd < 0)
-        return Status::Ok(); // a directory that may be written but not read cannot be flushed
-    ::fsync(fd);             // some file systems refuse this for directories; the data are safe
+        return;
+    ::fsync(fd);
     ::close(fd);
-    return Status::Ok();
 }
 
 } // namespace
@@ -53,29 +65,28 @@ AtomicFile::~AtomicFile() {
 
 Status AtomicFile::Open(const std::string& path) {
     Discard();
+    if (path.empty())
+        return Status::FromErrno("\"\"", ENOENT);
+    if (path.find('\0') != std::string::npos) // the system would see another, shorter name
+        return Status::FromErrno(path, EINVAL);
     std::string resolved = path;
     if (Status status = ResolveLinks(&resolved); !status)
         return status;
-    mode_t mode = NewFileMode();
     struct stat info {};
-    if (::stat(resolved.c_str(), &info) == 0) {
-        if (!S_ISREG(info.st_mode))
-            return Status::SystemFault(path + ": not a regular file");
-        if (::access(resolved.c_str(), W_OK) != 0)
-            return Status::FromErrno(path, errno); // renaming would pass over a write protection
-        mode = info.st_mode & 07777;
-    }
-    const PathParts parts = SplitPath(resolved);
-    // The name is cut so that the temporary one stays below the system's 255 bytes.
-    std::string name =
-        parts.directory + "." + (parts.name + parts.extension).substr(0, 200) + ".XXXXXX";
-    const int fd = ::mkostemp(name.data(), O_CLOEXEC);
+    const bool replaces = ::stat(resolved.c_str(), &info) == 0;
+    if (replaces && !S_ISREG(info.st_mode))
+        return Status::SystemFault(path + ": not a regular file");
+    if (replaces && ::access(resolved.c_str(), W_OK) != 0)
+        return Status::FromErrno(path, errno); // renaming would pass over a write protection
+    std::string name;
+    const int fd = MakeBeside(SplitPath(resolved), &name);
     if (fd < 0)
         return Status::FromErrno(path, errno);
     temporary = name;
     target = resolved;
     writeError = 0;
-    ::fchmod(fd, mode);
+    if (replaces)
+        ::fchmod(fd, info.st_mode & 07777);
     stream.reset(::fdopen(fd, "wb"));
     if (!stream) {
         const int error = errno;
@@ -113,8 +124,9 @@ Status AtomicFile::Commit(Durability durability) {
         return Status::FromErrno(name, error);
     }
     temporary.clear();
-    return durability == Durability::Flushed ? FlushDirectory(SplitPath(target).directory)
-                                             : Status::Ok();
+    if (durability == Durability::Flushed)
+        FlushDirectory(SplitPath(target).directory);
+    return Status::Ok();
 }
 
 void AtomicFile::Discard() {

@@ -1,5 +1,6 @@
 #include "base/file_access.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <fcntl.h>
 #include <filesystem>
@@ -36,12 +37,16 @@ bool IsDirectory(int fd) {
 } // namespace
 
 bool CanOpenForReading(const std::string& path) {
+    if (path.find('\0') != std::string::npos) // the system would see another, shorter name
+        return false;
     // Not blocking: a named pipe without a writer would hang the open.
     const Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     return file.IsOpen() && !IsDirectory(file.Get());
 }
 
 Status EmptyFile(const std::string& path) {
+    if (path.find('\0') != std::string::npos)
+        return Status::FromErrno(path, EINVAL);
     const Descriptor file(
         ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC | O_NONBLOCK, 0666));
     return file.IsOpen() ? Status::Ok() : Status::FromErrno(path, errno);
@@ -53,33 +58,34 @@ bool IsSameFile(const std::string& a, const std::string& b) {
 }
 
 Status ReadWholeFile(const std::string& path, std::size_t limit, std::string* content) {
-    const Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC));
+    // Not blocking, as a named pipe without a writer would: it reads as an empty file.
+    const Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     if (!file.IsOpen())
         return Status::FromErrno(path, errno);
-    if (IsDirectory(file.Get()))
-        return Status::FromErrno(path, EISDIR);
-    std::string text;
     struct stat info {};
-    if (::fstat(file.Get(), &info) == 0 && info.st_size > 0)
-        text.reserve(std::min(static_cast<std::size_t>(info.st_size), limit) + 1);
-    constexpr std::size_t kBlock = 1 << 20;
+    if (::fstat(file.Get(), &info) != 0)
+        return Status::FromErrno(path, errno);
+    if (S_ISDIR(info.st_mode))
+        return Status::FromErrno(path, EISDIR);
+    // One byte more than the file has, to see its end; a file that tells no size grows from there.
+    std::string text(std::min(static_cast<std::size_t>(info.st_size), limit) + 1, '\0');
+    std::size_t used = 0;
     for (;;) {
-        const std::size_t before = text.size();
-        text.resize(before + kBlock);
-        const ssize_t got = ::read(file.Get(), text.data() + before, kBlock);
-        if (got < 0 && errno == EINTR) {
-            text.resize(before);
+        const ssize_t got = ::read(file.Get(), text.data() + used, text.size() - used);
+        if (got < 0 && errno == EINTR)
             continue;
-        }
         if (got < 0)
             return Status::FromErrno(path, errno);
-        text.resize(before + static_cast<std::size_t>(got));
         if (got == 0)
             break;
-        if (text.size() > limit)
+        used += static_cast<std::size_t>(got);
+        if (used > limit)
             return Status::InputFault(path + ": the file is larger than " + std::to_string(limit) +
                                       " bytes");
+        if (used == text.size())
+            text.resize(std::max<std::size_t>(2 * used, 4096));
     }
+    text.resize(used);
     *content = std::move(text);
     return Status::Ok();
 }

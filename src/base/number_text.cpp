@@ -1,5 +1,6 @@
 #include "base/number_text.h"
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
@@ -24,15 +25,25 @@ std::string_view WithoutPlus(std::string_view text) {
     return text;
 }
 
-/// True where a number out of range is too small rather than too large: its exponent is negative,
-/// or it starts with 0 and has none.
-bool IsUnderflow(std::string_view text) {
-    const std::size_t exponent = text.find_first_of("eE");
-    if (exponent != std::string_view::npos)
-        return exponent + 1 < text.size() && text[exponent + 1] == '-';
-    if (!text.empty() && text[0] == '-')
-        text.remove_prefix(1);
-    return !text.empty() && (text[0] == '0' || text[0] == '.');
+/// The power of ten of the first digit that counts, of a text that is a number: 2 for "123",
+/// -3 for "0.00123". Exponents beyond a million are cut to it.
+long long PowerOfTen(std::string_view text) {
+    constexpr long long kLargest = 1'000'000;
+    const std::size_t mark = std::min(text.find_first_of("eE"), text.size());
+    const std::string_view digits = text.substr(0, mark);
+    long long exponent = 0;
+    if (mark < text.size()) {
+        const std::string_view written = WithoutPlus(text.substr(mark + 1));
+        const auto read =
+            std::from_chars(written.data(), written.data() + written.size(), exponent);
+        if (read.ec != std::errc())
+            exponent = written.front() == '-' ? -kLargest : kLargest;
+        exponent = std::clamp(exponent, -kLargest, kLargest);
+    }
+    const std::size_t point = std::min(digits.find('.'), digits.size());
+    const std::size_t first = std::min(digits.find_first_of("123456789"), digits.size());
+    const auto distance = static_cast<long long>(point) - static_cast<long long>(first);
+    return exponent + (first < point ? distance - 1 : distance);
 }
 
 template <typename Number>
@@ -43,8 +54,8 @@ std::optional<Number> Parse(std::string_view text) {
     const auto [stop, error] = std::from_chars(text.data(), end, value);
     if (stop != end || text.empty())
         return std::nullopt;
-    if (error == std::errc::result_out_of_range && IsUnderflow(text))
-        return Number{0};
+    if (error == std::errc::result_out_of_range && PowerOfTen(text) < 0)
+        return text.front() == '-' ? -Number{0} : Number{0};
     if (error != std::errc())
         return std::nullopt;
     return value;

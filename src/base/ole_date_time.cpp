@@ -63,10 +63,8 @@ int DaysInMonth(int year, int month) {
 }
 
 COleDateTime::COleDateTime(double dayCount) {
-    count = dayCount;
-    const double linear = LinearCount();
-    if (!(linear >= kFirstDay && linear < kPastLastDay)) // true for NaN
-        count = std::numeric_limits<double>::quiet_NaN();
+    const double whole = std::ceil(dayCount);
+    *this = FromLinearCount(dayCount > -kHalfSecond ? dayCount : whole - (dayCount - whole));
 }
 
 COleDateTime::COleDateTime(int year, int month, int day, int hour, int minute, int second) {
@@ -76,7 +74,14 @@ COleDateTime::COleDateTime(int year, int month, int day, int hour, int minute, i
     const auto whole = static_cast<double>(DaysFromCivil(year, month, day));
     const double fraction = static_cast<double>(hour * 3600 + minute * 60 + second) /
                             static_cast<double>(kSecondsPerDay);
-    count = whole >= 0.0 ? whole + fraction : whole - fraction;
+    linear = whole + fraction;
+}
+
+double COleDateTime::DayCount() const {
+    if (!(linear <= -kHalfSecond))
+        return linear;
+    const double whole = std::floor(linear);
+    return whole + (whole - linear);
 }
 
 COleDateTime::Fields COleDateTime::GetFields() const {

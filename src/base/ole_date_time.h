@@ -51,26 +51,19 @@ class COleDateTime {
     /// From fields; invalid when any is out of its range, 29 February of a common year included.
     COleDateTime(int year, int month, int day, int hour, int minute, int second);
 
-    bool IsValid() const { return count == count; }
-    /// The stored day count; NaN when invalid.
-    double DayCount() const { return count; }
-    /// Days since 30 December 1899 as a number without the sign rule above; NaN when invalid.
-    double LinearCount() const {
-        if (count > -kHalfSecond)
-            return count;
-        const double whole = std::ceil(count);
-        return whole - (count - whole);
-    }
-
     /// The date of a linear count; invalid when it is out of range or NaN.
-    static COleDateTime FromLinearCount(double linear) {
+    static COleDateTime FromLinearCount(double count) {
         COleDateTime date;
-        if (linear > -kHalfSecond && linear < kPastLastDay)
-            date.count = linear;
-        else if (linear >= kFirstDay && linear <= -kHalfSecond)
-            date.count = std::floor(linear) + (std::floor(linear) - linear);
+        if (count >= kFirstDay && count < kPastLastDay)
+            date.linear = count;
         return date;
     }
+
+    bool IsValid() const { return linear == linear; }
+    /// The day count by the sign rule above; NaN when invalid.
+    double DayCount() const;
+    /// Days since 30 December 1899 as a number without the sign rule; NaN when invalid.
+    double LinearCount() const { return linear; }
 
     Fields GetFields() const;
     int GetYear() const { return GetFields().year; }
@@ -110,9 +103,10 @@ class COleDateTime {
     static constexpr double kFirstDay = -657434.0;
     static constexpr double kPastLastDay = 2958466.0;
 
-    // A NaN stands for "invalid", so that a date takes the room of its number: a series of 10^7
-    // samples holds as many dates.
-    double count = std::numeric_limits<double>::quiet_NaN();
+    // The linear count: sums and differences by the signed one would lose a rounding's hair below a
+    // whole day to the next day. A NaN stands for "invalid", so that a date takes the room of its
+    // number: a series of 10^7 samples holds as many dates.
+    double linear = std::numeric_limits<double>::quiet_NaN();
 };
 
 /// True when a lies before b by half a second or more. Sums of day fractions are off by some 1e-11

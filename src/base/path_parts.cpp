@@ -19,14 +19,21 @@ PathParts SplitPath(std::string_view path) {
     return parts;
 }
 
-std::string FullPath(const std::string& name) {
+std::string FullPath(const std::string& name, const std::string& baseDirectory) {
     if (name.empty())
         return name;
     std::error_code error;
-    const std::filesystem::path absolute = std::filesystem::absolute(name, error);
+    const std::filesystem::path absolute =
+        std::filesystem::absolute(std::filesystem::path(baseDirectory) / name, error);
     if (error)
         return name;
-    return absolute.lexically_normal().string();
+    const std::filesystem::path last = absolute.filename();
+    const bool isDirectoryName = last.empty() || last == "." || last == "..";
+    const std::filesystem::path directory = isDirectoryName ? absolute : absolute.parent_path();
+    std::filesystem::path real = std::filesystem::weakly_canonical(directory, error);
+    if (error) // a loop of links, or a directory that may not be searched
+        return absolute.lexically_normal().string();
+    return (isDirectoryName ? real : real / last).string();
 }
 
 std::string WithTrailingSeparator(std::string directory) {

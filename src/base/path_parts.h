@@ -14,9 +14,12 @@ struct PathParts {
 
 PathParts SplitPath(std::string_view path);
 
-/// The absolute form of a name, taken against the current directory, "." and ".." resolved without
-/// looking at the disk; of any length. An empty name stays empty.
-std::string FullPath(const std::string& name);
+/// The absolute form of a name, taken against `baseDirectory` or, where that is empty, the current
+/// directory; of any length. Links on the way are followed, as far as the directories exist, so
+/// that
+/// ".." leads where the system leads; a link that the name itself is stays. An empty name stays
+/// empty.
+std::string FullPath(const std::string& name, const std::string& baseDirectory = {});
 
 /// A directory with its trailing separator; empty stays empty.
 std::string WithTrailingSeparator(std::string directory);

@@ -21,8 +21,10 @@ std::string CQxPath::GetFileNameRelativeTo(const std::string& baseDirectory) con
     const std::filesystem::path path(fileName);
     if (fileName.empty() || baseDirectory.empty() || path.is_relative())
         return fileName;
-    const std::filesystem::path base(FullPath(baseDirectory));
-    const std::filesystem::path relative = path.lexically_normal().lexically_relative(base);
+    // As a directory name, so that the base itself is followed where it is a link.
+    const std::filesystem::path base(FullPath(WithTrailingSeparator(baseDirectory)));
+    const std::filesystem::path relative =
+        std::filesystem::path(FullPath(fileName)).lexically_relative(base);
     return relative.empty() ? fileName : relative.string();
 }
 

@@ -16,9 +16,8 @@ class CQxPath {
     /// The directory with its trailing separator; empty when the name has none.
     std::string GetDirectoryName() const;
 
-    /// The name as seen from `baseDirectory`, without looking at the disk: links are not followed.
-    /// An empty name stays empty; a relative name, or an empty base directory, gives the name as it
-    /// stands.
+    /// The name as seen from `baseDirectory`, both taken as FullPath gives them. An empty name
+    /// stays empty; a relative name, or an empty base directory, gives the name as it stands.
     std::string GetFileNameRelativeTo(const std::string& baseDirectory) const;
 
   private:

@@ -61,12 +61,23 @@ Status SettleSpelling(const std::string& openedName, const std::string& askedNam
 }
 
 Status KeepBrokenFile(const std::string& path) {
-    if (!Exists(path))
+    std::error_code error;
+    if (!std::filesystem::is_regular_file(path, error)) // the save will say what it is
         return Status::Ok();
     std::string kept = path + ".broken";
     for (int number = 2; Exists(kept); ++number)
         kept = path + ".broken" + std::to_string(number);
-    return Rename(path, kept);
+    // A second name for the file, so that the first one is never without a file; a copy where the
+    // name is a link or the file system has no second names.
+    if (!std::filesystem::is_symlink(path, error)) {
+        std::filesystem::create_hard_link(path, kept, error);
+        if (!error)
+            return Status::Ok();
+    }
+    std::filesystem::copy_file(path, kept, error);
+    return error
+               ? Status::SystemFault(path + ": cannot be kept as " + kept + ": " + error.message())
+               : Status::Ok();
 }
 
 } // namespace ryn

@@ -26,8 +26,8 @@ std::string SavedParameterFileName(const std::string& path, const std::string& e
 Status SettleSpelling(const std::string& openedName, const std::string& askedName,
                       const std::string& savedName);
 
-/// Moves a file that could not be read whole out of the way of a save: NAME becomes NAME.broken, or
-/// NAME.broken2 and so on where that is taken. A name that does not exist is no fault.
+/// Keeps a file that could not be read whole before a save replaces it: as NAME.broken, or
+/// NAME.broken2 and so on where that is taken. What is no regular file is passed over.
 Status KeepBrokenFile(const std::string& path);
 
 } // namespace ryn

@@ -1,5 +1,7 @@
 #include "framework/kvf_base.h"
 
+#include <utility>
+
 namespace ryn {
 
 int CKvfBase::Check(CMessageList& /*messages*/, int /*flag*/) {
@@ -10,6 +12,10 @@ void CKvfBase::Reset(int /*argument*/) {}
 
 CKvfBase* CKvfBase::GetRoot() {
     return parent == nullptr ? this : parent->GetRoot();
+}
+
+const CKvfBase* CKvfBase::GetRoot() const {
+    return parent == nullptr ? this : std::as_const(*parent).GetRoot();
 }
 
 CKvfBase* CKvfBase::GetParent() {

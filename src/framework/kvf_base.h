@@ -26,6 +26,7 @@ class CKvfBase {
     /// Does nothing in every section of this system.
     virtual void Reset(int argument);
     virtual CKvfBase* GetRoot();
+    const CKvfBase* GetRoot() const;
     virtual CKvfBase* GetParent();
     /// A child section by id; null, since the sections here have no ids.
     virtual CKvfBase* FindChildKvf(unsigned long id);

@@ -38,13 +38,15 @@ int CQxDoc::DoSave(const std::string& path, int replace) {
     }
     const std::string previousName = GetPathName();
     const std::string previousTitle = GetTitle();
+    const bool wasModified = IsModified();
     (void)TakeSaveError();
     const int saved = OnSaveDocument(name);
     const Status error = TakeSaveError();
     const bool done = saved != 0 && error;
-    if (!done || replace == 0) { // the document keeps its own name
+    if (!done || replace == 0) { // the document keeps its own name, and its own file is as it was
         SetPathName(previousName, 0);
         SetTitle(previousTitle);
+        SetModifiedFlag(wasModified ? 1 : 0);
     }
     if (done)
         return 1;

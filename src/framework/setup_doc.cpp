@@ -17,6 +17,8 @@ bool CK44SetupDoc::Disabled(std::uint32_t /*page*/) const {
     return false;
 }
 
+void CK44SetupDoc::SetEngine(const std::string& /*name*/) {}
+
 FileChoicePort::SaveRequest CK44SetupDoc::MakeSaveRequest() const {
     return {fileExtension, std::string(Text(kTextParameterFileFilter)), ""};
 }

@@ -24,8 +24,8 @@ class CK44SetupDoc : public CQxDoc {
     virtual bool IsExecuting() const { return false; }
     /// Whether a page cannot be selected; false for every page.
     virtual bool Disabled(std::uint32_t page) const;
-    /// The name of the engine that the document belongs to.
-    virtual void SetEngine(const std::string& name) { engineName = name; }
+    /// For a framework that serves several engines; this system has one, and does nothing.
+    virtual void SetEngine(const std::string& name);
 
   protected:
     FileChoicePort::SaveRequest MakeSaveRequest() const override;
@@ -34,9 +34,6 @@ class CK44SetupDoc : public CQxDoc {
     std::unique_ptr<CK44SetupDlgEnumerator> enumerator;
     std::string fileExtension; ///< without the point
     std::unique_ptr<CKvfBase> rootSection;
-
-  private:
-    std::string engineName;
 };
 
 } // namespace ryn

@@ -48,8 +48,7 @@ int Truncated(double value) {
 } // namespace
 
 double CAnalysisKvf::SmallestReturnPeriod() const {
-    const auto* const root = dynamic_cast<const CGlobalKvf*>(
-        const_cast<CAnalysisKvf*>(this)->GetRoot()); // GetRoot is not const in the framework
+    const auto* const root = dynamic_cast<const CGlobalKvf*>(GetRoot());
     if (root == nullptr || root->DefineEVS().SelectionMethod != kSelectPartialDurations)
         return 1.0;
     const double rate = root->DefineEVS().AvgAnNum;

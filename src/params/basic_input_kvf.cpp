@@ -15,19 +15,16 @@ constexpr int kPage = 2;
 } // namespace
 
 int CBasicInputKvf::Check(CMessageList& messages, int /*flag*/) {
-    int found = 0;
-    if (!InputFileName.empty() && !CanOpenForReading(InputFileName)) {
+    const std::size_t before = messages.size();
+    if (!InputFileName.empty() && !CanOpenForReading(InputFileName))
         messages.push_back({kPage, std::string(Text(kTextCannotOpenInputFile))});
-        ++found;
-    }
     if (SelectionMethod == kSelectPartialDurations)
-        found += CheckPartialDurations(messages);
-    return found;
+        CheckPartialDurations(messages);
+    return static_cast<int>(messages.size() - before);
 }
 
-int CBasicInputKvf::CheckPartialDurations(CMessageList& messages) const {
+void CBasicInputKvf::CheckPartialDurations(CMessageList& messages) const {
     const bool byThreshold = PdsDataType == kPartialDurationsByThreshold;
-    const std::size_t before = messages.size();
     const auto add = [&messages](int id) { messages.push_back({kPage, std::string(Text(id))}); };
     // Written so that NaN, which a hand-edited file can hold, is a fault.
     if (!(RecordLength > 0.0))
@@ -45,7 +42,6 @@ int CBasicInputKvf::CheckPartialDurations(CMessageList& messages) const {
     if (byThreshold && !InputFileName.empty() && InputItem != 0 && summarised &&
         Threshold > summary.maximum.value)
         messages.push_back({kPage, FormatText(kTextThresholdBelowMaximum, summary.maximum.value)});
-    return static_cast<int>(messages.size() - before);
 }
 
 void CBasicInputKvf::Write(KvfTree* file, const std::string& baseDirectory) {
@@ -70,15 +66,15 @@ void CBasicInputKvf::Write(KvfTree* file, const std::string& baseDirectory) {
     kvfEndSection(file);
 }
 
-void CBasicInputKvf::Read(const KvfSection* enclosing, const std::string& /*baseDirectory*/) {
+void CBasicInputKvf::Read(const KvfSection* enclosing, const std::string& baseDirectory) {
     const KvfSection* const section = kvfSectionByNameNum(enclosing, "BasicInput", 1);
     kvfGetParam(section, "SelectionMethod", &SelectionMethod, 1, 1);
     kvfGetParam(section, "PdsDataType", &PdsDataType, 1, 1);
     kvfGetParam(section, "InputFileName", &InputFileName, 1, 1);
-    InputFileName = FullPath(InputFileName);
+    InputFileName = FullPath(InputFileName, baseDirectory);
     kvfGetParam(section, "InputItem", &InputItem, 1, 1);
     kvfGetParam(section, "OutputFileName", &OutputFileName, 1, 1);
-    OutputFileName = FullPath(OutputFileName);
+    OutputFileName = FullPath(OutputFileName, baseDirectory);
     kvfGetParam(section, "IncludeSeasonalAnalysis", &IncludeSeasonalAnalysis, 1, 1);
     kvfGetParam(section, "InterTimeSpecified", &InterTimeSpecified, 1, 1);
     kvfGetParam(section, "InterLevelSpecified", &InterLevelSpecified, 1, 1);
@@ -91,7 +87,7 @@ void CBasicInputKvf::Read(const KvfSection* enclosing, const std::string& /*base
     GetDate(section, "SeasonalStartDate", &SeasonalStartDate);
     GetDate(section, "SeasonalEndDate", &SeasonalEndDate);
     if (!InputFileName.empty() && InputItem != 0)
-        summary.ReadSummary(InputFileName, InputItem - 1);
+        summary.ReadSummary(InputFileName, ItemIndex(InputItem));
 }
 
 } // namespace ryn

@@ -28,7 +28,7 @@ class CBasicInputKvf : public CKvfBase, public SelectionRules {
     CTsqValues summary;
 
   private:
-    int CheckPartialDurations(CMessageList& messages) const;
+    void CheckPartialDurations(CMessageList& messages) const;
 };
 
 } // namespace ryn

@@ -43,9 +43,8 @@ int CDefineEVSKvf::Check(CMessageList& messages, int /*flag*/) {
     return static_cast<int>(messages.size() - before);
 }
 
-int CDefineEVSKvf::CheckPartialDurations(CMessageList& messages) const {
+void CDefineEVSKvf::CheckPartialDurations(CMessageList& messages) const {
     constexpr double kTolerance = 1e-8;
-    const std::size_t before = messages.size();
     // Written so that NaN, which a hand-edited file can hold, is a fault.
     if (!(Threshold >= 0.0))
         messages.push_back(Finding(kTextThresholdNotNegative));
@@ -53,7 +52,6 @@ int CDefineEVSKvf::CheckPartialDurations(CMessageList& messages) const {
         messages.push_back(Finding(kTextRecordLengthPositive));
     if (!InputFileName.empty() && InputItem != 0 && Threshold - summary.minimum.value > kTolerance)
         messages.push_back({kPage, FormatText(kTextThresholdAtMostMinimum, summary.minimum.value)});
-    return static_cast<int>(messages.size() - before);
 }
 
 void CDefineEVSKvf::Write(KvfTree* file, const std::string& baseDirectory) {
@@ -76,20 +74,20 @@ void CDefineEVSKvf::Write(KvfTree* file, const std::string& baseDirectory) {
     kvfEndSection(file);
 }
 
-void CDefineEVSKvf::Read(const KvfSection* enclosing, const std::string& /*baseDirectory*/) {
+void CDefineEVSKvf::Read(const KvfSection* enclosing, const std::string& baseDirectory) {
     const KvfSection* const section = kvfSectionByNameNum(enclosing, "DefineEVS", 1);
     kvfGetParam(section, "SelectionMethod", &SelectionMethod, 1, 1);
     kvfGetParam(section, "InputFileName", &InputFileName, 1, 1);
-    InputFileName = FullPath(InputFileName);
+    InputFileName = FullPath(InputFileName, baseDirectory);
     kvfGetParam(section, "OutputFileName", &OutputFileName, 1, 1);
-    OutputFileName = FullPath(OutputFileName);
+    OutputFileName = FullPath(OutputFileName, baseDirectory);
     kvfGetParam(section, "InputItem", &InputItem, 1, 1);
     kvfGetParam(section, "Title", &Title, 1, 1);
     kvfGetParam(section, "Subtitle", &Subtitle, 1, 1);
     kvfGetParam(section, "Threshold", &Threshold, 1, 1);
     kvfGetParam(section, "AvgAnNum", &AvgAnNum, 1, 1);
     if (!InputFileName.empty() && InputItem != 0)
-        summary.ReadSummary(InputFileName, InputItem - 1);
+        summary.ReadSummary(InputFileName, ItemIndex(InputItem));
 }
 
 void CDefineEVSKvf::SyncFromExtraction(const CBasicInputKvf& basic) {
@@ -98,14 +96,16 @@ void CDefineEVSKvf::SyncFromExtraction(const CBasicInputKvf& basic) {
     InputFileName = basic.OutputFileName;
     InputItem = 1;
     SelectionMethod = basic.SelectionMethod;
-    summary.ReadSummary(InputFileName, 0);
-    double recordLength = summary.count;
+    const int events = summary.ReadSummary(InputFileName, 0) ? summary.count : 0;
+    double recordLength = events;
     if (SelectionMethod == kSelectPartialDurations) {
-        Threshold = basic.PdsDataType != kPartialDurationsByThreshold ? summary.minimum.value
-                                                                      : basic.Threshold;
         recordLength = basic.RecordLength;
+        if (basic.PdsDataType == kPartialDurationsByThreshold)
+            Threshold = basic.Threshold;
+        else if (events > 0) // an empty series has no smallest value
+            Threshold = summary.minimum.value;
     }
-    AvgAnNum = recordLength != 0.0 ? summary.count / recordLength : 0.0;
+    AvgAnNum = recordLength != 0.0 ? events / recordLength : 0.0;
 }
 
 } // namespace ryn

@@ -27,7 +27,8 @@ class CDefineEVSKvf : public CKvfBase {
 
     /// Takes over what an extraction produced, once `Extracted` of the basic input is set: series
     /// file, selection method, threshold, and events a year. A record length of 0 gives 0 events a
-    /// year, as the page shows it.
+    /// year, as the page shows it; an empty series, and one that cannot be read, has no events and
+    /// leaves a threshold that would be its smallest value.
     void SyncFromExtraction(const CBasicInputKvf& basic);
 
     int SelectionMethod = 0;    ///< 0 the series is an AMS, 1 a PDS
@@ -42,7 +43,7 @@ class CDefineEVSKvf : public CKvfBase {
     CTsqValues summary;
 
   private:
-    int CheckPartialDurations(CMessageList& messages) const;
+    void CheckPartialDurations(CMessageList& messages) const;
 };
 
 } // namespace ryn

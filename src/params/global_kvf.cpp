@@ -45,7 +45,7 @@ void CGlobalKvf::WriteExtremeValues(KvfTree* file) {
     const bool fromSeries = !defineEvs.InputFileName.empty();
     const bool fromOutput = !fromSeries && !basicInput.OutputFileName.empty();
     if (fromSeries)
-        values.ReadSeries(defineEvs.InputFileName, defineEvs.InputItem - 1);
+        values.ReadSeries(defineEvs.InputFileName, ItemIndex(defineEvs.InputItem));
     else if (fromOutput)
         values.ReadSeries(basicInput.OutputFileName, 0);
     values.WriteExtremeValueSection(

@@ -22,8 +22,8 @@ struct Ports {
     ProgressPort* progress;
 };
 
-/// Ports that show nothing, answer No, choose no file and are named "RYN Editor": what a document has
-/// until it is given others.
+/// Ports that show nothing, answer No (or Cancel where that is offered), choose no file and are
+/// named "RYN Editor": what a document has until it is given others.
 const Ports& SilentPorts();
 
 } // namespace ryn

@@ -38,7 +38,7 @@ ExtractionResult Prepare(CGlobalKvf& root) {
     if (ExtractionResult refused = TestInput(basic); !refused.status)
         return refused;
     // Read before the output is emptied: a bad input must not cost the old series.
-    if (!root.Values().ReadSeries(basic.InputFileName, basic.InputItem - 1))
+    if (!root.Values().ReadSeries(basic.InputFileName, ItemIndex(basic.InputItem)))
         return Refused(0, Status::InputFault(FormatText(kTextExtractionInputBad,
                                                         root.Values().ReadError().Text())));
     if (const Status emptied = EmptyFile(basic.OutputFileName); !emptied)
@@ -50,11 +50,10 @@ ExtractionResult Prepare(CGlobalKvf& root) {
 
 } // namespace
 
-ExtractionResult ExtractSeriesOf(CGlobalKvf& root, const Ports& ports) {
+ExtractionResult ExtractSeriesOf(CGlobalKvf& root) {
     CTsqValues& values = root.Values();
     ExtractionResult result = Prepare(root);
     if (result.status) {
-        values.UsePorts(ports);
         result.report = values.ExtractSeries(root.BasicInput().OutputFileName, root.BasicInput(),
                                              /*silent=*/false);
         if (!result.report.written)

@@ -2,7 +2,6 @@
 
 #include "base/status.h"
 #include "params/global_kvf.h"
-#include "ports/ports.h"
 
 namespace ryn {
 
@@ -14,10 +13,10 @@ struct ExtractionResult {
 
 /// The Extract command from the sections on: tests the paths, reads the samples of the basic
 /// input's item, empties the output file, extracts into it and frees the samples. Threshold and
-/// AvgAnNum of the basic input can change. What refuses it is shown through the message port and
-/// told in the status; until the output file is emptied nothing has changed.
+/// AvgAnNum of the basic input can change. Until the output file is emptied nothing has changed.
 ///
-/// Taking the series over into DefineEVS, and saving, are the caller's.
-ExtractionResult ExtractSeriesOf(CGlobalKvf& root, const Ports& ports);
+/// Missing years and changed parameters are shown through the ports of the root's series. Showing
+/// what refused the command, taking the series over into DefineEVS, and saving, are the caller's.
+ExtractionResult ExtractSeriesOf(CGlobalKvf& root);
 
 } // namespace ryn

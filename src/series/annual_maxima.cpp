@@ -39,6 +39,8 @@ class Period {
         start = season->Start().MidnightIn(year);
         end = season->Wraps() ? season->End().MidnightIn(year + 1)
                               : season->End().MidnightIn(year) + COleDateTimeSpan(1.0);
+        if (!end.IsValid()) // behind the calendar's last day
+            end = MonthDay().MidnightIn(year + 1);
     }
 
   private:

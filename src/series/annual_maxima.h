@@ -10,7 +10,7 @@ namespace ryn {
 struct AnnualMaxima {
     /// One for each year or season with samples, in time order; they point into the samples.
     std::vector<const STSItem*> selection;
-    /// Years between the first and the last sample whose year or season holds no sample.
+    /// Years that the walk passed over on its way from one sample in season to the next.
     std::vector<int> missingYears;
 };
 

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstddef>
 #include <limits>
 #include <optional>
 
@@ -157,6 +158,13 @@ double SortKey(const STSItem& sample) {
     return std::isnan(sample.value) ? -std::numeric_limits<double>::infinity() : sample.value;
 }
 
+/// By date, and of equal dates by the place in the series.
+bool IsEarlier(const STSItem* a, const STSItem* b) {
+    const double first = a->date.LinearCount();
+    const double second = b->date.LinearCount();
+    return first != second ? first < second : a < b;
+}
+
 /// The number of peaks asked for, cut to an integer. A product a hair below one (0.29 x 100) counts
 /// as that integer.
 double RequiredNumber(const SelectionRules& rules) {
@@ -179,8 +187,7 @@ void KeepLargest(const SelectionRules& rules, PartialDurations* result) {
     } else {
         selection.resize(static_cast<std::size_t>(required));
     }
-    // The samples lie in time order in one array, so their addresses sort by date.
-    std::sort(selection.begin(), selection.end());
+    std::sort(selection.begin(), selection.end(), IsEarlier);
 }
 
 } // namespace

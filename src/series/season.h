@@ -1,6 +1,6 @@
 #pragma once
 
-#include <cstdint>
+#include <compare>
 #include <limits>
 
 #include "base/ole_date_time.h"

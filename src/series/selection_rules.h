@@ -30,7 +30,7 @@ struct SelectionRules {
 
 /// Whether the dates that a selection by these rules goes by are valid ones.
 inline bool NeededDatesAreValid(const SelectionRules& rules) {
-    const bool byYear = rules.SelectionMethod == kSelectAnnualMaxima;
+    const bool byYear = rules.SelectionMethod != kSelectPartialDurations;
     if (!rules.IncludeSeasonalAnalysis)
         return !byYear || rules.AmsStartDate.IsValid();
     // Without the time criterion a partial duration series takes samples in season or not.

@@ -3,7 +3,7 @@
 #include <array>
 #include <charconv>
 #include <cmath>
-#include <limits>
+#include <new>
 #include <string_view>
 
 #include "series/annual_maxima.h"
@@ -18,6 +18,7 @@ namespace ryn {
 namespace {
 
 constexpr double kSecondsPerDay = 86400.0;
+constexpr double kSecondsGrace = 1e-6;
 
 /// Reads "%d-%d-%d %d:%d:%d"; an invalid date when the text is none.
 COleDateTime ParseDateAndTime(std::string_view text) {
@@ -41,7 +42,8 @@ COleDateTime ParseDateAndTime(std::string_view text) {
 COleDateTimeSpan StartSpan(double hours) {
     const double seconds = hours * 3600.0;
     const double nearest = std::round(seconds);
-    const double whole = std::fabs(seconds - nearest) < 1e-6 ? nearest : std::trunc(seconds);
+    const double whole =
+        std::fabs(seconds - nearest) < kSecondsGrace ? nearest : std::trunc(seconds);
     const double days = std::trunc(whole / kSecondsPerDay);
     const auto rest = static_cast<int>(whole - days * kSecondsPerDay);
     return {static_cast<long>(days), rest / 3600, rest / 60 % 60, rest % 60};
@@ -95,10 +97,22 @@ bool ReadAxis(const TsqHeader* header, Axis* axis) {
 
 /// Days from the start date to a step of an equidistant axis, whose stored time is not looked at.
 COleDateTimeSpan EquidistantSpan(int index, double stepSeconds) {
-    const double seconds = index * stepSeconds;
+    const double seconds = index * stepSeconds + kSecondsGrace;
     const double days = Floor(seconds / kSecondsPerDay);
     const auto rest = static_cast<int>(seconds - days * kSecondsPerDay);
     return {static_cast<long>(days), rest / 3600, rest / 60 % 60, rest % 60};
+}
+
+/// What a summary keeps of an item.
+struct Extent {
+    STSItem minimum{{}, CTsqValues::kHighestValue, 0};
+    STSItem maximum{{}, -CTsqValues::kHighestValue, 0};
+    STSItem first;
+    STSItem last;
+};
+
+Status OutOfMemory(const std::string& path) {
+    return Status::SystemFault(path + ": there is not enough memory for the series");
 }
 
 Status TimeOutOfCalendar(const std::string& path) {
@@ -116,7 +130,6 @@ struct CTsqValues::OpenItem {
     double toSecondsFactor = 1.0;
     double toSecondsOffset = 0.0;
     int itemIndex = 0;
-    int itemCount = 0;
     int itemType = 0;
     int itemUnit = 0;
     std::string itemName;
@@ -129,9 +142,12 @@ struct CTsqValues::OpenItem {
         tsqHeaderDestroy(&header);
     }
 
-    double Seconds(double time) const { return time * toSecondsFactor + toSecondsOffset; }
+    /// Whole seconds of a time; one that conversions left a hair short of a second counts as it.
+    double WholeSeconds(double time) const {
+        return Floor(time * toSecondsFactor + toSecondsOffset + kSecondsGrace);
+    }
     COleDateTime DateByFile(double time) const {
-        return COleDateTime::FromLinearCount(startCount + Floor(Seconds(time)) / kSecondsPerDay);
+        return COleDateTime::FromLinearCount(startCount + WholeSeconds(time) / kSecondsPerDay);
     }
     COleDateTime DateByStep(int index) const {
         return COleDateTime::FromLinearCount(
@@ -140,7 +156,11 @@ struct CTsqValues::OpenItem {
 
     Status UnderstandAxis(const std::string& path);
     Status FindItem(const std::string& path);
-    /// Calls use(index, time, value) for each time step.
+    /// The time of a step by the file, in the axis's unit.
+    double TimeOf(const TsqBlock& block, int first, int i) const {
+        return block.times != nullptr ? block.times[i] : (first + i) * axis.step;
+    }
+    /// Calls use(first step, block) for each block of time steps, until it gives false.
     template <typename Use>
     bool Walk(Use use);
 };
@@ -152,11 +172,11 @@ Status CTsqValues::OpenItem::UnderstandAxis(const std::string& path) {
     if (qtyConvertUnit(axis.unit, axis.start, kUnitHour, &hours) != 0 ||
         !UnitConversion(axis.unit, kUnitSecond, &toSecondsFactor, &toSecondsOffset))
         return Status::InputFault(path + ": the unit of the time axis is no unit of time");
-    constexpr double kLongestOffset = 9000.0 * 366 * 24; // hours: the length of the calendar
+    constexpr double kLongestOffset = 10000.0 * 366 * 24; // hours: more than the calendar has
     if (!(std::fabs(hours) < kLongestOffset))
         return Status::InputFault(path + ": the start of the time axis is out of range");
     if (axis.IsEquidistant() &&
-        !(std::fabs(Seconds(axis.step)) * axis.count < 3600.0 * kLongestOffset))
+        !(std::fabs(axis.step * toSecondsFactor) * axis.count < 3600.0 * kLongestOffset))
         return Status::InputFault(path + ": the step of the time axis is out of range");
     const COleDateTime startDate = ParseDateAndTime(axis.date + " " + axis.time) + StartSpan(hours);
     startCount = startDate.LinearCount();
@@ -167,11 +187,11 @@ Status CTsqValues::OpenItem::UnderstandAxis(const std::string& path) {
 }
 
 Status CTsqValues::OpenItem::FindItem(const std::string& path) {
-    itemCount = tsqGetNoOfItems(header.get());
     TsqItem* const item = tsqItemD(header.get(), itemIndex + 1);
     if (item == nullptr)
         return Status::InputFault(path + ": there is no item " + std::to_string(itemIndex + 1) +
-                                  "; the file has " + std::to_string(itemCount));
+                                  "; the file has " +
+                                  std::to_string(tsqGetNoOfItems(header.get())));
     if (tsqGetItemDimensions(item) != 0)
         return Status::InputFault(path + ": item " + std::to_string(itemIndex + 1) +
                                   " is no plain series: it has spatial dimensions");
@@ -190,18 +210,13 @@ Status CTsqValues::OpenItem::FindItem(const std::string& path) {
 
 template <typename Use>
 bool CTsqValues::OpenItem::Walk(Use use) {
-    for (int step = 0; step < axis.count; ++step) {
-        for (int skipped = 0; skipped < itemIndex; ++skipped)
-            if (tsqReadItemTimeStep(header.get(), file.get(), nullptr, nullptr) != 0)
-                return false;
-        double time = 0.0;
-        float value = 0.0F;
-        if (tsqReadItemTimeStep(header.get(), file.get(), &time, &value) != 0)
+    TsqBlock block;
+    for (int first = 0; first < axis.count; first += block.count) {
+        if (tsqReadItemBlock(header.get(), file.get(), itemIndex + 1, &block) != 0 ||
+            block.count == 0)
             return false;
-        for (int skipped = itemIndex + 1; skipped < itemCount; ++skipped)
-            if (tsqReadItemTimeStep(header.get(), file.get(), nullptr, nullptr) != 0)
-                return false;
-        use(step, time, static_cast<double>(value));
+        if (!use(first, block))
+            return false;
     }
     return true;
 }
@@ -224,67 +239,81 @@ void CTsqValues::TakeOver(const OpenItem& open) {
     timeUnit = open.axis.unit;
 }
 
-bool CTsqValues::ReadSummary(const std::string& path, int itemIndex) {
-    const STSItem lowest{{}, kHighestValue, 0};
-    const STSItem highest{{}, -kHighestValue, 0};
-    minimum = lowest;
-    maximum = highest;
+bool CTsqValues::ReadSummary(const std::string& path, int itemIndex) try {
+    Extent extent;
+    minimum = extent.minimum;
+    maximum = extent.maximum;
     OpenItem open;
     readError = Open(path, itemIndex, &open);
     if (!readError)
         return false;
-    STSItem smallest = lowest;
-    STSItem largest = highest;
-    STSItem firstSample;
-    STSItem lastSample;
-    const bool whole = open.Walk([&](int step, double time, double value) {
+    const auto sampleAt = [&open](const TsqBlock& block, int step, int i) {
+        return STSItem{open.DateByFile(open.TimeOf(block, step, i)),
+                       static_cast<double>(block.values[i]), 0};
+    };
+    const bool whole = open.Walk([&](int step, const TsqBlock& block) {
         if (step == 0)
-            firstSample = {open.DateByFile(time), value, 0};
-        if (step == open.axis.count - 1)
-            lastSample = {open.DateByFile(time), value, 0};
-        if (smallest.value > value)
-            smallest = {open.DateByFile(time), value, 0};
-        if (value > largest.value)
-            largest = {open.DateByFile(time), value, 0};
+            extent.first = sampleAt(block, step, 0);
+        for (int i = 0; i < block.count; ++i) {
+            // Strictly, so that of several equal extremes the earliest stands.
+            if (extent.minimum.value > static_cast<double>(block.values[i]))
+                extent.minimum = sampleAt(block, step, i);
+            if (static_cast<double>(block.values[i]) > extent.maximum.value)
+                extent.maximum = sampleAt(block, step, i);
+        }
+        extent.last = sampleAt(block, step, block.count - 1);
+        return true;
     });
-    if (!whole) {
-        readError = tsqTakeError();
-        return false;
-    }
-    if (open.axis.count > 0 && !(firstSample.date.IsValid() && lastSample.date.IsValid())) {
-        readError = TimeOutOfCalendar(path);
+    const bool dated =
+        open.axis.count == 0 || (extent.first.date.IsValid() && extent.last.date.IsValid());
+    if (!whole || !dated) {
+        readError = whole ? TimeOutOfCalendar(path) : tsqTakeError();
         return false;
     }
     TakeOver(open);
-    minimum = smallest;
-    maximum = largest;
-    first = firstSample;
-    last = lastSample;
+    minimum = extent.minimum;
+    maximum = extent.maximum;
+    first = extent.first;
+    last = extent.last;
     return true;
+} catch (const std::bad_alloc&) {
+    readError = OutOfMemory(path);
+    return false;
 }
 
-bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) {
+bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) try {
     OpenItem open;
     readError = Open(path, itemIndex, &open);
     if (!readError)
         return false;
     SampleArray read;
     read.reserve(static_cast<std::size_t>(open.axis.count));
-    const bool equidistant = open.axis.IsEquidistant();
     bool datesValid = true;
-    const bool whole = open.Walk([&](int step, double time, double value) {
-        const COleDateTime date = equidistant ? open.DateByStep(step) : open.DateByFile(time);
+    const auto append = [&](const COleDateTime& date, float value) {
         datesValid = datesValid && date.IsValid();
-        read.push_back({date, value, 0});
+        read.push_back({date, static_cast<double>(value), 0});
+    };
+    const bool whole = open.Walk([&](int step, const TsqBlock& block) {
+        if (open.axis.IsEquidistant()) {
+            for (int i = 0; i < block.count; ++i)
+                append(open.DateByStep(step + i), block.values[i]);
+        } else {
+            for (int i = 0; i < block.count; ++i)
+                append(open.DateByFile(block.times[i]), block.values[i]);
+        }
+        return datesValid;
     });
-    if (!whole || !datesValid) {
-        readError = whole ? TimeOutOfCalendar(path) : tsqTakeError();
+    if (!whole) {
+        readError = datesValid ? tsqTakeError() : TimeOutOfCalendar(path);
         return false;
     }
     TakeOver(open);
     title = tsqGetFileTitle(open.header.get());
     samples = std::move(read);
     return true;
+} catch (const std::bad_alloc&) {
+    readError = OutOfMemory(path);
+    return false;
 }
 
 void CTsqValues::ClearSeries() {
@@ -292,37 +321,44 @@ void CTsqValues::ClearSeries() {
     count = 0;
 }
 
+std::vector<const STSItem*> CTsqValues::Select(SelectionRules& rules, bool silent,
+                                               ExtractionReport* report) {
+    if (rules.SelectionMethod != kSelectPartialDurations) {
+        AnnualMaxima maxima = SelectAnnualMaxima(samples, rules);
+        report->missingYears = std::move(maxima.missingYears);
+        if (!report->missingYears.empty())
+            ports->missingYears->ShowMissingYears(report->missingYears);
+        return std::move(maxima.selection);
+    }
+    PartialDurations peaks = SelectPartialDurations(samples, rules);
+    report->parametersChanged = peaks.fewerThanRequired;
+    if (peaks.fewerThanRequired) {
+        rules.AvgAnNum = peaks.AvgAnNum;
+        rules.Threshold = peaks.Threshold;
+        if (!silent)
+            ports->messages->Show(MessageKind::Warning,
+                                  std::string(Text(kTextPeaksFewerThanRequired)));
+    }
+    return std::move(peaks.selection);
+}
+
 ExtractionReport CTsqValues::ExtractSeries(const std::string& outputPath, SelectionRules& rules,
                                            bool silent) {
     ExtractionReport report;
-    std::vector<const STSItem*> selection;
-    if (rules.SelectionMethod == kSelectAnnualMaxima) {
-        AnnualMaxima maxima = SelectAnnualMaxima(samples, rules);
-        selection = std::move(maxima.selection);
-        report.missingYears = std::move(maxima.missingYears);
-        if (!report.missingYears.empty())
-            ports->missingYears->ShowMissingYears(report.missingYears);
-    } else {
-        PartialDurations peaks = SelectPartialDurations(samples, rules);
-        selection = std::move(peaks.selection);
-        report.parametersChanged = peaks.fewerThanRequired;
-        if (peaks.fewerThanRequired) {
-            rules.AvgAnNum = peaks.AvgAnNum;
-            rules.Threshold = peaks.Threshold;
-            if (!silent)
-                ports->messages->Show(MessageKind::Warning,
-                                      std::string(Text(kTextPeaksFewerThanRequired)));
+    try {
+        const std::vector<const STSItem*> selection = Select(rules, silent, &report);
+        report.selected = static_cast<int>(selection.size());
+        if (!selection.empty()) {
+            report.first = selection.front()->date;
+            report.last = selection.back()->date;
         }
+        const bool hasCalendarAxis = axisKind == AxisKind::EquidistantCalendar ||
+                                     axisKind == AxisKind::NonEquidistantCalendar;
+        report.written = WriteSeriesFile(
+            outputPath, {title, itemName, itemType, itemUnit, hasCalendarAxis}, selection, *ports);
+    } catch (const std::bad_alloc&) {
+        report.written = OutOfMemory(outputPath);
     }
-    report.selected = static_cast<int>(selection.size());
-    if (!selection.empty()) {
-        report.first = selection.front()->date;
-        report.last = selection.back()->date;
-    }
-    const SeriesFileContent content{title, itemName, itemType, itemUnit,
-                                    axisKind == AxisKind::EquidistantCalendar ||
-                                        axisKind == AxisKind::NonEquidistantCalendar};
-    report.written = WriteSeriesFile(outputPath, content, selection, *ports);
     return report;
 }
 

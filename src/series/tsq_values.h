@@ -20,6 +20,11 @@ enum class AxisKind : int {
     NonEquidistantCalendar = 3,
 };
 
+/// The index, from 0, of an item number, from 1; -1, which no file has, for a number below 1.
+constexpr int ItemIndex(int itemNumber) {
+    return itemNumber < 1 ? -1 : itemNumber - 1;
+}
+
 /// What an extraction did.
 struct ExtractionReport {
     int selected = 0;
@@ -86,6 +91,9 @@ class CTsqValues {
     struct OpenItem;
     Status Open(const std::string& path, int itemIndex, OpenItem* open) const;
     void TakeOver(const OpenItem& open);
+    /// Selects, shows what is to be shown, and changes the rules where the selection does.
+    std::vector<const STSItem*> Select(SelectionRules& rules, bool silent,
+                                       ExtractionReport* report);
 
     const Ports* ports = &SilentPorts();
     Status readError;

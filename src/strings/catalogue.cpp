@@ -67,7 +67,7 @@ constexpr std::array kEntries = std::to_array<Entry>({
     {kTextInterTimeNotNegative, "Inter Event Time must be greater or equal to 0",
      "イベント間隔時間は 0 以上でなければなりません"},
     {kTextInterLevelFraction, "Inter Event Level must be in interval (0,1)",
-     "イベント間水位比は (0,1) の範囲でなければなりません"},
+     "イベント間レベルは (0,1) の範囲でなければなりません"},
     {kTextThresholdBelowMaximum, "Threshold must be smaller than %.3f",
      "閾値は %.3f より小さくなければなりません"},
     {kTextInputFileMissing, "Input file not specified", "入力ファイルが指定されていません"},

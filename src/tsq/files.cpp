@@ -138,6 +138,17 @@ int tsqReadItemTimeStep(TsqHeader* header, TsqFile* file, double* time, float* b
     return FailReading(Status::SystemFault("not enough memory for a block of time steps"));
 }
 
+int tsqReadItemBlock(TsqHeader* header, TsqFile* file, int itemNumber, TsqBlock* block) try {
+    const TsqItem* const item = tsqItemD(header, itemNumber);
+    if (file == nullptr || !file->reader || item == nullptr || tsqGetItemDimensions(item) != 0)
+        return FailReading(Status::InputFault("no such plain series in a file open for reading"));
+    return file->reader->NextBlock(static_cast<std::size_t>(itemNumber - 1), block)
+               ? 0
+               : FailReading(file->reader->Failure());
+} catch (const std::bad_alloc&) {
+    return FailReading(Status::SystemFault("not enough memory for a block of time steps"));
+}
+
 int tsqCountMissing(TsqHeader* header, TsqFile* file, int itemNumber, int* missing) try {
     if (file == nullptr || !file->reader || tsqItemD(header, itemNumber) == nullptr)
         return FailReading(Status::InputFault("no such item in a file open for reading"));

@@ -27,13 +27,42 @@ bool StepReader::LoadTimes() {
     return failure.IsOk();
 }
 
-bool StepReader::LoadValues() {
-    StepBlock<float>& block = blocks[item];
+bool StepReader::LoadValues(std::size_t wanted) {
+    StepBlock<float>& block = blocks[wanted];
     block.size = 0;
-    failure = source->LoadValues(item, step, &block);
+    failure = source->LoadValues(wanted, step, &block);
     if (!failure)
         block.size = 0;
     return failure.IsOk();
+}
+
+bool StepReader::NextBlock(std::size_t wanted, TsqBlock* block) {
+    if (item != 0) {
+        failure = Status::InputFault(path + ": a time step is begun");
+        return false;
+    }
+    TsqBlock found;
+    if (step < count && !FindBlock(wanted, &found))
+        return false;
+    step += static_cast<std::size_t>(found.count);
+    *block = found;
+    return true;
+}
+
+bool StepReader::FindBlock(std::size_t wanted, TsqBlock* found) {
+    StepBlock<float>& values = blocks[wanted];
+    if (!values.Holds(step) && !LoadValues(wanted))
+        return false;
+    std::size_t end = std::min(count, values.first + values.size);
+    if (!(equidistantStep > 0.0)) {
+        if (!times.Holds(step) && !LoadTimes())
+            return false;
+        end = std::min(end, times.first + times.size);
+        found->times = times.At(step);
+    }
+    found->values = values.At(step);
+    found->count = static_cast<int>(end - step);
+    return true;
 }
 
 bool StepReader::NoteFailure() {

@@ -6,6 +6,7 @@
 
 #include "tsq/records.h"
 #include "tsq/step_source.h"
+#include "tsq/tsq.h"
 
 namespace ryn {
 
@@ -26,7 +27,10 @@ class StepReader {
         }
         return true;
     }
-    /// Why Next failed.
+    /// The steps from the current one on that are at hand of one item, up to the end of the shorter
+    /// block of times and values; passes over them.
+    bool NextBlock(std::size_t wanted, TsqBlock* block);
+    /// Why Next or NextBlock failed.
     const Status& Failure() const { return failure; }
     Status CountMissing(std::size_t itemIndex, std::size_t* missing);
 
@@ -43,7 +47,7 @@ class StepReader {
     }
     bool GiveValues(float* values) {
         StepBlock<float>& block = blocks[item];
-        if (!block.Holds(step) && !LoadValues())
+        if (!block.Holds(step) && !LoadValues(item))
             return false;
         const float* const from = block.At(step);
         *values = *from;
@@ -51,8 +55,9 @@ class StepReader {
             std::copy_n(from, block.width, values);
         return true;
     }
+    bool FindBlock(std::size_t wanted, TsqBlock* found);
     bool LoadTimes();
-    bool LoadValues();
+    bool LoadValues(std::size_t wanted);
     bool NoteFailure();
 
     std::string path;

@@ -99,6 +99,18 @@ int tsqFindBlockDynamic(TsqHeader* header, TsqFile* file);
 /// step too, nothing moves.
 int tsqReadItemTimeStep(TsqHeader* header, TsqFile* file, double* time, float* buffer);
 
+/// Consecutive time steps of one item, in the store's own memory until the next operation on the
+/// file.
+struct TsqBlock {
+    const double* times = nullptr; ///< in the axis's unit; null on an equidistant axis
+    const float* values = nullptr;
+    int count = 0; ///< steps
+};
+/// Reads the steps from the current one on that the store has at hand, of one item without spatial
+/// dimensions, and passes over them. The current step must not be begun. At the end of the file the
+/// block is empty.
+int tsqReadItemBlock(TsqHeader* header, TsqFile* file, int itemNumber, TsqBlock* block);
+
 // Writing.
 
 int tsqHeaderCreate(int fileType, const std::string& title, const std::string& applicationName,

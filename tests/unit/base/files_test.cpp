@@ -60,6 +60,8 @@ TEST(AtomicFile, RefusesWhatIsNoRegularFile) {
     EXPECT_THAT(Save("/dev/full", "x").Text(), HasSubstr("/dev/full: not a regular file"));
     EXPECT_THAT(Save(directory.Path("none/a.txt"), "x").Text(), HasSubstr("none/a.txt"));
     EXPECT_FALSE(Save(directory.Root().string(), "x"));
+    EXPECT_FALSE(Save("", "x"));
+    EXPECT_FALSE(Save(directory.Path(std::string("a.txt\0.ryn", 10)), "x"));
     EXPECT_EQ(directory.EntryCount(), 0U);
 }
 

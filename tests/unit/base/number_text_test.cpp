@@ -35,6 +35,12 @@ TEST(NumberText, ReadsWholeTextsOnly) {
          {"", " 1", "1 ", "1,5", "0x10", "+-1", "++1", "1e", "abc", "1e999", "-1e999", "1.5.2"})
         EXPECT_EQ(ParseDouble(text), std::nullopt) << text;
     EXPECT_EQ(ParseDouble("1e-999"), 0.0);
+    EXPECT_TRUE(std::signbit(*ParseDouble("-1e-999")));
+    const std::string zeros(400, '0');
+    EXPECT_EQ(ParseDouble("1" + zeros + "e-1"), std::nullopt);
+    EXPECT_EQ(ParseDouble("0." + zeros + "1e1"), 0.0);
+    EXPECT_EQ(ParseDouble("1e-99999999999999999999"), 0.0);
+    EXPECT_EQ(ParseDouble("1e99999999999999999999"), std::nullopt);
     EXPECT_EQ(ParseFloat("1e39"), std::nullopt);
     EXPECT_EQ(ParseFloat("0.00000000000000000000000000000000000000000000000001"), 0.0F);
     EXPECT_TRUE(std::isnan(*ParseDouble("NaN")));

@@ -27,6 +27,16 @@ TEST(COleDateTime, KeepsTheTimeOfDayAsAPositiveFractionBelowZero) {
     EXPECT_LT(COleDateTime(1899, 12, 29, 6, 0, 0), COleDateTime(1899, 12, 29, 18, 0, 0));
 }
 
+// A sum can lie a rounding's hair below a whole day, which the signed count cannot hold.
+TEST(COleDateTime, KeepsADateThatASumPutAHairBelowMidnight) {
+    for (double day = 2.0; day < 600000.0; day *= 2.0) {
+        const double below = std::nextafter(1.0 - day, -1e9);
+        const COleDateTime date = COleDateTime(1.0 - day) + COleDateTimeSpan(below - (1.0 - day));
+        EXPECT_EQ(date.GetFields().day, COleDateTime(1.0 - day).GetFields().day) << day;
+        EXPECT_EQ(date, COleDateTime(1.0 - day));
+    }
+}
+
 TEST(COleDateTime, RefusesFieldsThatNoCalendarHas) {
     EXPECT_FALSE(COleDateTime(2001, 2, 29, 0, 0, 0).IsValid());
     EXPECT_FALSE(COleDateTime(1900, 2, 29, 0, 0, 0).IsValid());

@@ -31,6 +31,21 @@ TEST(FullPath, CountsFromTheCurrentDirectoryAtAnyLength) {
     EXPECT_EQ(FullPath(longName), directory.Path(longName));
 }
 
+TEST(FullPath, LeadsThroughLinksWhereTheSystemLeads) {
+    const test::TemporaryDirectory directory;
+    std::filesystem::create_directories(directory.Root() / "real/deep");
+    std::filesystem::create_directory_symlink("real/deep", directory.Root() / "link");
+    directory.Write("real/gauge.tsq0", "");
+    EXPECT_EQ(FullPath(directory.Path("link/../gauge.tsq0")), directory.Path("real/gauge.tsq0"));
+    EXPECT_EQ(FullPath("new.tsq0", directory.Path("link")), directory.Path("real/deep/new.tsq0"));
+    EXPECT_EQ(FullPath(directory.Path("link")), directory.Path("link"));
+    EXPECT_EQ(CQxPath(directory.Path("link/a.tsq0")).GetFileNameRelativeTo(directory.Path("link")),
+              "a.tsq0");
+    EXPECT_EQ(
+        CQxPath(directory.Path("real/deep/a.tsq0")).GetFileNameRelativeTo(directory.Path("link/")),
+        "a.tsq0");
+}
+
 TEST(CQxPath, TellsItsDirectoryWithTheSeparator) {
     EXPECT_EQ(CQxPath("/a/b/case.ryn").GetDirectoryName(), "/a/b/");
     EXPECT_EQ(CQxPath("case.ryn").GetDirectoryName(), "");

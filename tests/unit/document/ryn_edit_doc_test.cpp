@@ -92,6 +92,49 @@ TEST(Document, KeepsEveryBrokenFile) {
     EXPECT_EQ(directory.EntryCount(), 3U);
 }
 
+TEST(Document, KeepsTheFileBehindALinkAndLeavesWhatIsNoFileAlone) {
+    const TemporaryDirectory directory;
+    std::filesystem::create_symlink("data.RYN", directory.Root() / "link.RYN");
+    directory.Write("data.RYN", "{broken");
+    Opened linked;
+    linked.document.OnOpenDocument(directory.Path("link.RYN"));
+    linked.document.OnSaveDocument(directory.Path("link.RYN"));
+    EXPECT_EQ(directory.Read("link.RYN.broken"), "{broken");
+    EXPECT_THAT(directory.Read("data.RYN"), HasSubstr("ExtremeValueSection"));
+    EXPECT_TRUE(std::filesystem::is_symlink(directory.Root() / "link.RYN"));
+
+    std::filesystem::create_directory(directory.Root() / "folder.RYN");
+    Opened folder;
+    folder.document.OnOpenDocument(directory.Path("folder.RYN"));
+    folder.document.OnSaveDocument(directory.Path("folder.RYN"));
+    EXPECT_THAT(folder.document.TakeSaveError().Text(), HasSubstr("not a regular file"));
+    EXPECT_TRUE(std::filesystem::is_directory(directory.Root() / "folder.RYN"));
+}
+
+TEST(Document, KeepsItsNamesThroughALinkedDirectory) {
+    const TemporaryDirectory directory;
+    std::filesystem::create_directories(directory.Root() / "real/deep");
+    std::filesystem::create_directory_symlink("real/deep", directory.Root() / "link");
+    directory.Write("real/deep/case.RYN",
+                    "RynEditor { BasicInput { InputFileName = \"gauge.tsq0\" } }");
+    for (int turn = 0; turn < 3; ++turn) {
+        Opened opened;
+        opened.document.OnOpenDocument(directory.Path("link/case.RYN"));
+        opened.document.OnSaveDocument(directory.Path("link/case.RYN"));
+        EXPECT_THAT(directory.Read("real/deep/case.RYN"),
+                    HasSubstr("InputFileName = \"gauge.tsq0\""));
+    }
+}
+
+TEST(Document, OfWhichACopyIsSavedStaysModified) {
+    const TemporaryDirectory directory;
+    Opened opened;
+    opened.document.SetModifiedFlag(1);
+    EXPECT_NE(opened.document.DoSave(directory.Path("copy.RYN"), 0), 0);
+    EXPECT_TRUE(opened.document.IsModified());
+    EXPECT_EQ(opened.document.GetTitle(), "Untitled");
+}
+
 TEST(Document, IsNotReadWholeWithoutItsTarget) {
     const TemporaryDirectory directory;
     Opened opened;

@@ -355,6 +355,21 @@ TEST(SyncFromExtraction, TakesTheThresholdOrTheSmallestValueOfAPartialSeries) {
 TEST(SyncFromExtraction, GivesNoEventsAYearForAnEmptySeries) {
     Synced synced(0, 0, {});
     EXPECT_EQ(synced.Define().AvgAnNum, 0.0);
+    Synced byNumber(1, 1, {});
+    EXPECT_EQ(byNumber.Define().AvgAnNum, 0.0);
+    EXPECT_EQ(byNumber.Define().Threshold, 99.0);
+}
+
+TEST(ParameterFile, TakesNoItemNumberBelowOne) {
+    const TemporaryDirectory directory;
+    ASSERT_TRUE(WriteDataFile(directory.Path("in.tsq0"), Daily("2000-01-01", {1})));
+    CGlobalKvf root;
+    ReadText(root,
+             "RynEditor { BasicInput { InputFileName = \"in.tsq0\"\n InputItem = -2147483648 }\n"
+             "DefineEVS { InputFileName = \"in.tsq0\"\n InputItem = -2147483648 } }",
+             directory.Path(""));
+    EXPECT_EQ(root.BasicInput().summary.count, 0);
+    EXPECT_THAT(TextOf(root), HasSubstr("NoOfItems = 0\n        ExtremeValues =\n"));
 }
 
 TEST(ExtremeValuesInTheFile, ComeFromTheSeriesFileInForce) {

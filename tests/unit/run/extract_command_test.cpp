@@ -25,6 +25,7 @@ struct Case {
     CGlobalKvf root;
 
     Case() {
+        root.Values().UsePorts(ports);
         CBasicInputKvf& basic = root.BasicInput();
         basic.InputFileName = directory.Path("in.tsq0");
         basic.OutputFileName = directory.Path("out.tsq0");
@@ -32,7 +33,7 @@ struct Case {
         EXPECT_TRUE(
             WriteDataFile(basic.InputFileName, SamplesOf({{"1990-05-01", 3}, {"1991-05-01", 4}})));
     }
-    ExtractionResult Run() { return ExtractSeriesOf(root, ports); }
+    ExtractionResult Run() { return ExtractSeriesOf(root); }
 };
 
 TEST(ExtractCommand, WritesTheSeriesAndFreesTheSamples) {

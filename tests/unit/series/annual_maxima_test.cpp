@@ -137,6 +137,10 @@ TEST(AnnualMaxima, EndAtTheCalendarsLastYear) {
     Samples samples = SamplesOf({{"9998-06-01", 1}, {"9999-06-01", 2}, {"9999-12-31 23:59:59", 3}});
     EXPECT_THAT(ValuesOf(SelectAnnualMaxima(samples, SelectionRules()).selection),
                 ElementsAre(1, 3));
+    for (STSItem& sample : samples)
+        sample.selected = 0;
+    EXPECT_THAT(ValuesOf(SelectAnnualMaxima(samples, SeasonOf("01-01", "12-31")).selection),
+                ElementsAre(1, 3));
 }
 
 // A day fraction summed up from hours lies a hair beside the same moment computed from its fields.

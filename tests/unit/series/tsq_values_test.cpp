@@ -122,6 +122,45 @@ TEST(SeriesReading, CountsARelativeAxisFrom1900) {
     EXPECT_EQ(Stamp(values.samples[1].date), "1900-01-03 12:00:00");
 }
 
+// Thirds of an hour lie a hair below their seconds; days before 1900 have no room for a hair.
+TEST(SeriesReading, PutsHoursAndOldMidnightsWhereTheyBelong) {
+    const TemporaryDirectory directory;
+    DataFile file(directory.Path("a.tsq0"), 1);
+    tsqSetNeqCalendarAxis(file.Header(), "1894-01-01", "01:00:00", kUnitHour, 0.0, 0);
+    constexpr int kSteps = 3 * 24 * 200;
+    for (int i = 0; i < kSteps; ++i)
+        file.Step(i / 3.0, {static_cast<float>(i)});
+    file.Close();
+    CTsqValues values;
+    ASSERT_TRUE(values.ReadSeries(directory.Path("a.tsq0"), 0));
+    for (int i = 0; i < kSteps; ++i) {
+        const COleDateTime expected = At("1894-01-01") +
+                                      COleDateTimeSpan(i / 72, i / 3 % 24, i % 3 * 20, 0) +
+                                      COleDateTimeSpan(0, 1, 0, 0);
+        ASSERT_EQ(Stamp(values.samples[static_cast<std::size_t>(i)].date), Stamp(expected)) << i;
+    }
+}
+
+TEST(SeriesReading, ReadsMoreStepsThanABlockHolds) {
+    const TemporaryDirectory directory;
+    for (const bool equidistant : {false, true}) {
+        DataFile file(directory.Path("a.tsq0"), 2);
+        if (equidistant)
+            tsqSetEqCalendarAxis(file.Header(), "1990-01-01", "00:00:00", kUnitSecond, 0.0, 60.0,
+                                 0);
+        else
+            tsqSetNeqCalendarAxis(file.Header(), "1990-01-01", "00:00:00", kUnitSecond, 0.0, 0);
+        for (int i = 0; i < 50000; ++i)
+            file.Step(i * 60.0, {0.0F, static_cast<float>(i)});
+        file.Close();
+        CTsqValues values;
+        ASSERT_TRUE(values.ReadSeries(directory.Path("a.tsq0"), 1));
+        ASSERT_EQ(values.samples.size(), 50000U);
+        EXPECT_EQ(values.samples[40000].value, 40000.0);
+        EXPECT_EQ(values.samples[49999].date, At("1990-01-01") + COleDateTimeSpan(49999 / 1440.0));
+    }
+}
+
 TEST(SeriesReading, LeavesEverythingAsItWasWhenAFileCannotBeRead) {
     const TemporaryDirectory directory;
     const std::string good = directory.Path("a.tsq0");
