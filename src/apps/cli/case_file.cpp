@@ -49,7 +49,7 @@ int CaseFile::Open(const std::string& name) {
     if (const int refused = Report(console, TestReadable(shownName)))
         return refused;
     document.OnOpenDocument(path);
-    if (!ports.Messages().empty())
+    if (ports.MessageCount() > 0)
         return kExitInput;
     if (!document.WasReadWhole())
         return Report(console, Status::InputFault(FormatText(kTextCliNoTarget, shownName)));

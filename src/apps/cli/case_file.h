@@ -26,7 +26,6 @@ class CaseFile {
 
     CGlobalKvf& Root() { return document.GetGlobalKvf(); }
     CRynEditDoc& Document() { return document; }
-    ConsolePorts& OutsidePorts() { return ports; }
     /// The name as the user gave it, in the spelling that is read or written.
     const std::string& ShownName() const { return shownName; }
 

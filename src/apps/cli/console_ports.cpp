@@ -1,6 +1,5 @@
 #include "apps/cli/console_ports.h"
 
-#include <algorithm>
 #include <ostream>
 
 #include "strings/catalogue.h"
@@ -37,13 +36,9 @@ ConsolePorts::ConsolePorts(Console& shownOn, Consent answerToQuestions)
       progress(shownOn),
       ports{this, this, this, this, this, this, &progress} {}
 
-bool ConsolePorts::HasShown(const std::string& text) const {
-    return std::find(messages.begin(), messages.end(), text) != messages.end();
-}
-
 void ConsolePorts::Show(MessageKind kind, const std::string& text) {
     progress.Clear();
-    messages.push_back(text);
+    ++messageCount;
     switch (kind) {
     case MessageKind::Error:
         ShowError(console, text);

@@ -29,7 +29,8 @@ class ProgressLine final : public ProgressPort {
 };
 
 /// The command line's answers to a document's ports: messages go to standard error, questions are
-/// answered by --yes, missing years are kept for the command to print, no file is chosen.
+/// answered by --yes, no file is chosen. Missing years stand in the extraction's report, which the
+/// command prints.
 class ConsolePorts final : public MessagePort,
                            public MissingYearsPort,
                            public FileChoicePort,
@@ -43,16 +44,13 @@ class ConsolePorts final : public MessagePort,
 
     operator const Ports&() const { return ports; }
 
-    /// Every message so far, as it was given.
-    const std::vector<std::string>& Messages() const { return messages; }
-    const std::vector<int>& MissingYears() const { return missingYears; }
-    /// Whether a message with this text was shown.
-    bool HasShown(const std::string& text) const;
+    /// How many messages were shown so far.
+    int MessageCount() const { return messageCount; }
 
     void Show(MessageKind kind, const std::string& text) override;
     Answer AskYesNo(const std::string& question) override;
     Answer AskYesNoCancel(const std::string& question) override { return AskYesNo(question); }
-    void ShowMissingYears(const std::vector<int>& years) override { missingYears = years; }
+    void ShowMissingYears(const std::vector<int>& /*years*/) override {}
     std::optional<std::string> ChooseFileToSave(const SaveRequest& request) override;
     void ReleaseFocus() override {}
     void AddRecentFile(const std::string& /*path*/) override {}
@@ -62,8 +60,7 @@ class ConsolePorts final : public MessagePort,
     Console& console;
     Consent consent;
     ProgressLine progress;
-    std::vector<std::string> messages;
-    std::vector<int> missingYears;
+    int messageCount = 0;
     Ports ports;
 };
 

@@ -72,10 +72,8 @@ Json JsonOfReport(const ExtractionReport& report, const std::vector<ChangedSetti
             {"changed", std::move(changed)}};
 }
 
-int ReportRefusal(const Status& status, const CaseFile& file, Console& console,
-                  const ConsolePorts& ports) {
-    if (!ports.HasShown(status.Text()))
-        ShowError(console, file.ShownName() + ": " + status.Text());
+int ReportRefusal(const Status& status, const CaseFile& file, Console& console) {
+    ShowError(console, file.ShownName() + ": " + status.Text());
     return status.Kind() == Fault::Input ? kExitInput : kExitSystem;
 }
 
@@ -103,7 +101,7 @@ int RunExtract(const ExtractOptions& options, Console& console) {
     const std::vector<std::string> before = ValuesOf(settings);
     const ExtractionResult result = ExtractSeriesOf(file.Root());
     if (!result.status)
-        return ReportRefusal(result.status, file, console, file.OutsidePorts());
+        return ReportRefusal(result.status, file, console);
     CBasicInputKvf& basic = file.Root().BasicInput();
     basic.Extracted = true; // so that the series is taken over at once
     file.Root().DefineEVS().SyncFromExtraction(basic);

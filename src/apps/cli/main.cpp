@@ -40,6 +40,8 @@ int main(int argumentCount, char** arguments) {
     FillClosedStreams();
     // A reader that goes away must not end the program in the middle of making a file.
     std::signal(SIGPIPE, SIG_IGN);
+    // Nor a limit on the size of files: the write fails, and what was written is taken away.
+    std::signal(SIGXFSZ, SIG_IGN);
     ryn::cli::DescriptorOutput buffer(STDOUT_FILENO);
     std::ostream out(&buffer);
     ryn::cli::Console console{out, std::cerr, std::cin, ::isatty(STDERR_FILENO) != 0};

@@ -74,7 +74,7 @@ TEST_F(InfoCommand, TellsTheExtentOfASeries) {
     EXPECT_EQ(out, R"({"axis":"non-equidistantcalendar","count":4,"title":"gauge",)"
                    R"("first":"1990-01-01T00:00:00","last":"1990-03-02T00:00:00",)"
                    R"("longestGap":{"from":"1990-01-01T06:00:30","to":"1990-03-01T00:00:00",)"
-                   R"("days":58.74965277777778},"items":[{"name":"Durchfluß","unit":"m3/s",)"
+                   R"("days":58.749652777777776},"items":[{"name":"Durchfluß","unit":"m3/s",)"
                    R"("values":4,"missing":0,"first":{"date":"1990-01-01T00:00:00","value":3.25},)"
                    R"("last":{"date":"1990-03-02T00:00:00","value":7.0},)"
                    R"("minimum":{"date":"1990-01-01T06:00:30","value":0.1},)"
