@@ -66,12 +66,10 @@ void PeakMarker::MarkForward() {
     for (Index i = 0; i < Count(); ++i) {
         if (!IsInSeason(i))
             continue;
-        if (last == kNone) {
-            last = i;
-        } else if (AreFarApart(last, i)) {
+        if (last != kNone && AreFarApart(last, i)) {
             At(last).selected = 1;
             last = i;
-        } else if (Value(i) > Value(last) && PassesPeakForward(i)) {
+        } else if (last == kNone || (Value(i) > Value(last) && PassesPeakForward(i))) {
             last = i;
         }
     }

@@ -17,7 +17,8 @@ struct MonthDay {
         const COleDateTime::Fields fields = date.GetFields();
         return {fields.month, fields.day};
     }
-    auto operator<=>(const MonthDay&) const = default;
+    // The check takes the zero of a defaulted comparison for a pointer.
+    auto operator<=>(const MonthDay&) const = default; // NOLINT(modernize-use-nullptr)
 
     /// This day in a year: 29 February becomes 1 March in a common year.
     MonthDay In(int year) const;
