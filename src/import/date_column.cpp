@@ -26,7 +26,7 @@ std::vector<DateForm> FittingForms(const SampleRows& rows, std::size_t column,
 
 std::vector<DateForm> FormsOfNumbers(const SampleRows& rows, std::size_t column) {
     bool isDigits = false;
-    for (const std::size_t size : {8, 10, 12, 14})
+    for (const unsigned size : {8U, 10U, 12U, 14U})
         isDigits = isDigits || rows.HasDigitsOnly(column, size);
     if (!isDigits)
         return {};

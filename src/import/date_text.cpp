@@ -121,7 +121,9 @@ bool TakeClockTail(TextCursor* cursor, TimeParts* parts) {
     if (c == 'T' || c == ' ' || c == '/' || c == '-' || c == ':' || c == '_' || c == ',') {
         cursor->Skip();
         cursor->SkipBlanks();
-        return ParseClock(cursor->Rest(), parts);
+        // Behind a comma only a clock with a colon: "2001-01-01,5" is a date and a value.
+        return (c != ',' || cursor->Rest().find(':') != std::string_view::npos) &&
+               ParseClock(cursor->Rest(), parts);
     }
     return false;
 }

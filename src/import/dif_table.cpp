@@ -99,7 +99,7 @@ Status DifReader::TakeHeader(std::string_view text) {
         item.name = ToUtf8(fields[2], encoding);
     if (fields[0] == "EHD" && fields.Size() > 2)
         item.unit = ToUtf8(fields[2], encoding);
-    if (fields[0] == "LOC" && fields.Size() > 2)
+    if (fields[0] == "LOC" && fields.Size() > 2 && report->notes.empty())
         report->notes.push_back("station: " + ToUtf8(fields[2], encoding));
     return Status::Ok();
 }

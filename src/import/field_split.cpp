@@ -79,11 +79,16 @@ bool FieldList::Split(std::string_view record, char delimiter) {
     fields.clear();
     if (!record.empty() && std::memchr(record.data(), '"', record.size()) != nullptr)
         return SplitQuoted(record, delimiter);
+    SplitUnquoted(record, delimiter);
+    return true;
+}
+
+void FieldList::SplitUnquoted(std::string_view record, char delimiter) {
+    fields.clear();
     if (delimiter == kBlanks)
         SplitAtBlanks(record);
     else
         SplitPlain(record, delimiter);
-    return true;
 }
 
 void FieldList::SplitPlain(std::string_view record, char delimiter) {

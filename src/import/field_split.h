@@ -17,6 +17,8 @@ class FieldList {
     /// closing one, whatever stands between; a doubled quote is one quote. False when a quote is
     /// still open at the end of the text.
     bool Split(std::string_view record, char delimiter);
+    /// The same with quotes as plain characters.
+    void SplitUnquoted(std::string_view record, char delimiter);
 
     std::size_t Size() const { return fields.size(); }
     std::string_view operator[](std::size_t index) const { return fields[index]; }

@@ -41,9 +41,11 @@ Status CheckOtherRuns(const TableShape& shape, const std::vector<RowRun>& runs,
             break;
         constexpr std::size_t kMany = 10;
         if (run.count > kMany || run.count * 5 > chosen.count)
-            return Status::InputFault(
-                "lines " + LinesText(shape, run) + " and " + LinesText(shape, chosen) +
-                " are two tables; give the lines before the one to take with --skip");
+            return Status::InputFault("lines " + LinesText(shape, run) + " and " +
+                                      LinesText(shape, chosen) +
+                                      " look like two tables, with something else between; take "
+                                      "that out, or give the lines before the one to take with "
+                                      "--skip");
         few += (few.empty() ? "" : ", ") + LinesText(shape, run);
     }
     if (!few.empty())
@@ -184,6 +186,11 @@ Status GuessFromHead(const TableHead& head, const ImportSettings& settings, Tabl
     const std::optional<TableShape> shape = FindShape(head, settings);
     if (!shape)
         return Status::InputFault("no rows with numbers were found");
+    constexpr std::size_t kMostColumns = 10000;
+    if (shape->fieldCount > kMostColumns)
+        return Status::InputFault("a row has " + std::to_string(shape->fieldCount) +
+                                  " columns; at most " + std::to_string(kMostColumns) +
+                                  " are read");
     TableLayout guessed;
     guessed.encoding = head.encoding;
     guessed.delimiter = shape->delimiter;
@@ -204,8 +211,7 @@ Status GuessLayout(TextSource& source, const ImportSettings& settings, TableLayo
         return status;
     encoding = settings.encoding.value_or(encoding);
     // A preamble may be longer than the first look; then the next one reaches further.
-    constexpr HeadLimits kLooks[] = {
-        {2000, 4 * kMegabyte}, {20000, 16 * kMegabyte}, {200000, 64 * kMegabyte}};
+    constexpr HeadLimits kLooks[] = {{2000, 4 * kMegabyte}, {50000, 16 * kMegabyte}};
     for (const HeadLimits& limits : kLooks) {
         TableHead head;
         status = ReadHead(source, encoding, settings.skipLines, limits, &head);

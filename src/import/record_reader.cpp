@@ -19,19 +19,22 @@ ReadResult RecordReader::ReadLine(TableRecord* record) {
 ReadResult RecordReader::Split(TableRecord* record, FieldList* fields) {
     if (fields->Split(record->text, delimiter))
         return ReadResult::Found;
+    // Each line with a quote is a new look at the whole, so that their number is the factor by
+    // which a hostile table can slow this down.
+    constexpr int kMostLooks = 100;
     joined.assign(record->text);
     std::string_view next;
-    while (joined.size() <= LineReader::kLongestLine) {
+    for (int looks = 0; looks < kMostLooks && joined.size() <= LineReader::kLongestLine;) {
         const ReadResult result = lines.Read(&next);
         if (result == ReadResult::Failed)
             return result;
         if (result == ReadResult::End)
             break;
         joined.append("\n").append(next);
-        // Only a line with a quote can close one: the others need no second look, which keeps the
-        // work proportional to the text.
+        // Only a line with a quote can close one.
         if (next.find('"') == std::string_view::npos)
             continue;
+        ++looks;
         if (fields->Split(joined, delimiter)) {
             record->text = joined;
             return ReadResult::Found;

@@ -14,7 +14,7 @@ SampleRows::SampleRows(const TableShape& shape, const RowRun& run,
       decimal(shape.decimal) {
     for (std::size_t i = run.first; i <= run.last && i < shape.rows.size(); ++i) {
         const HeadRow& row = shape.rows[i];
-        if (!row.isComment && !row.isDivider && row.fields.size() == shape.fieldCount)
+        if (row.hasData && row.fields.size() == shape.fieldCount)
             rows.push_back(row.Views());
     }
 }

@@ -14,8 +14,10 @@ namespace {
 
 // A field's kind is decided by most rows, not by all: a faulty row is named when it is read.
 constexpr double kMost = 0.8;
-// How far an open quote is followed in the head before it is taken for a plain character.
-constexpr std::size_t kMostJoinedLines = 50;
+// How far an open quote is followed in the head before it is taken for a plain character, and how
+// many characters may be looked at again for that in the whole head.
+constexpr std::size_t kMostJoinedLines = 20;
+constexpr std::size_t kMostJoinedBytes = std::size_t{1} << 24;
 
 bool LooksLikeTime(std::string_view field) {
     constexpr std::size_t kLongestTime = 40;
@@ -23,7 +25,7 @@ bool LooksLikeTime(std::string_view field) {
                                    DateForm::MonthDayYear, DateForm::ShortYearMonthDay,
                                    DateForm::Compact,      DateForm::YearMonth,
                                    DateForm::Duration};
-    if (field.size() > kLongestTime)
+    if (field.size() > kLongestTime || std::none_of(field.begin(), field.end(), IsDigit))
         return false;
     for (const DateForm form : kForms) {
         TimeParts parts;
@@ -34,43 +36,59 @@ bool LooksLikeTime(std::string_view field) {
     return field.find(':') != std::string_view::npos && ParseClock(field, &parts);
 }
 
-/// Splits the line at `index` of the head, joined with those after it while a quote is open.
-/// Returns how many lines it took.
-std::size_t SplitHeadLine(const TableHead& head, std::size_t index, char delimiter,
-                          const std::vector<std::string>& marks, HeadRow* row) {
-    const TableHead::Line& line = head.lines[index];
-    row->line = line.number;
-    row->text = line.text;
-    const std::size_t mark = CommentMarkSize(line.text, marks);
-    row->isComment = mark > 0;
-    row->isDivider = !row->isComment && IsSeparatorLine(line.text, delimiter);
-    FieldList list;
-    std::size_t used = 1;
-    bool isClosed = list.Split(std::string_view(row->text).substr(mark), delimiter);
-    while (!isClosed && !row->isComment && used < kMostJoinedLines &&
-           index + used < head.lines.size()) {
-        row->text += "\n" + head.lines[index + used++].text;
-        isClosed = list.Split(row->text, delimiter);
-    }
-    if (!isClosed) {
-        row->text = line.text;
-        row->fields.assign(1, std::string(Trimmed(line.text)));
-        return 1;
-    }
-    row->fields.assign(list.All().begin(), list.All().end());
-    return used;
-}
+/// Splits the lines of a head into rows.
+class HeadSplitter {
+  public:
+    HeadSplitter(const TableHead& tableHead, char fieldDelimiter,
+                 const std::vector<std::string>& commentMarks)
+        : head(tableHead),
+          delimiter(fieldDelimiter),
+          marks(commentMarks) {}
 
-std::vector<HeadRow> SplitHead(const TableHead& head, char delimiter,
-                               const std::vector<std::string>& marks) {
-    std::vector<HeadRow> rows;
-    for (std::size_t i = 0; i < head.lines.size();) {
-        HeadRow row;
-        i += SplitHeadLine(head, i, delimiter, marks, &row);
-        rows.push_back(std::move(row));
+    std::vector<HeadRow> Split() {
+        std::vector<HeadRow> rows;
+        for (std::size_t i = 0; i < head.lines.size();) {
+            HeadRow row;
+            i += SplitLine(i, &row);
+            rows.push_back(std::move(row));
+        }
+        return rows;
     }
-    return rows;
-}
+
+  private:
+    /// Splits the line at `index`, joined with those after it while a quote is open. Returns how
+    /// many lines it took.
+    std::size_t SplitLine(std::size_t index, HeadRow* row) {
+        const TableHead::Line& line = head.lines[index];
+        row->line = line.number;
+        row->text = line.text;
+        const std::size_t mark = CommentMarkSize(line.text, marks);
+        row->isComment = mark > 0;
+        row->isDivider = !row->isComment && IsSeparatorLine(line.text, delimiter);
+        std::size_t used = 1;
+        bool isClosed = list.Split(std::string_view(row->text).substr(mark), delimiter);
+        while (!isClosed && !row->isComment && used < kMostJoinedLines &&
+               index + used < head.lines.size() && looked < kMostJoinedBytes) {
+            row->text += "\n" + head.lines[index + used++].text;
+            looked += row->text.size();
+            isClosed = list.Split(row->text, delimiter);
+        }
+        if (!isClosed) {
+            // In a preamble an inch sign, in a row a fault that reading will name.
+            used = 1;
+            row->text = line.text;
+            list.SplitUnquoted(std::string_view(row->text).substr(mark), delimiter);
+        }
+        row->fields.assign(list.All().begin(), list.All().end());
+        return used;
+    }
+
+    const TableHead& head;
+    char delimiter;
+    const std::vector<std::string>& marks;
+    FieldList list;
+    std::size_t looked = 0; ///< characters of joined lines
+};
 
 /// Share of a row's fields that are understood; 0 for a row without any number or time.
 double Explained(const HeadRow& row, char decimal) {
@@ -92,16 +110,25 @@ const HeadRow* FirstLine(const TableShape& shape) {
     return at == shape.rows.end() ? nullptr : &*at;
 }
 
+/// Whole numbers with one comma between in all rows, under a title without a comma.
+bool IsColumnOfDecimalCommas(const TableShape& shape) {
+    const HeadRow* first = FirstLine(shape);
+    if (shape.delimiter != ',' || first == nullptr || first->fields.size() != 1)
+        return false;
+    return std::all_of(shape.rows.begin(), shape.rows.end(), [](const HeadRow& row) {
+        std::string_view whole = row.fields[0];
+        if (!whole.empty() && (whole[0] == '-' || whole[0] == '+'))
+            whole.remove_prefix(1);
+        return row.fields.size() != 2 || (IsDigits(whole) && IsDigits(row.fields[1]));
+    });
+}
+
 /// How far a number of fields is to be believed. One field needs no delimiter, so that a table with
-/// one goes before it ("1871,1120" is a year and a value rather than a decimal comma); but two
-/// fields with a comma between, under a title without one, are a decimal comma.
+/// one goes before it: "1871,1120" is a year and a value rather than a decimal comma.
 double Belief(const TableShape& shape, std::size_t fieldCount) {
     if (fieldCount == 1)
         return 0.9;
-    const HeadRow* first = FirstLine(shape);
-    const bool isSingleTitle =
-        first != nullptr && first->fields.size() == 1 && Explained(*first, shape.decimal) == 0.0;
-    return shape.delimiter == ',' && fieldCount == 2 && isSingleTitle ? 0.8 : 1.0;
+    return fieldCount == 2 && IsColumnOfDecimalCommas(shape) ? 0.8 : 1.0;
 }
 
 /// The number of fields that explains most, and how much it does.
@@ -134,18 +161,17 @@ ColumnKind KindOfColumn(const std::vector<const HeadRow*>& rows, std::size_t col
     return counts[FieldKind::Time] >= kMost * present ? ColumnKind::Time : ColumnKind::Text;
 }
 
-/// The kinds of the columns by the last quarter of the rows of that size, which a header with numbers
-/// in it does not reach; where a column is empty there, by more of them.
+/// The kinds of the columns by the last quarter of the rows of that size, which a header with
+/// numbers in it does not reach; where a column is empty there, by more of them.
 std::vector<ColumnKind> KindsOfColumns(const TableShape& shape) {
     std::vector<const HeadRow*> rows;
     for (const HeadRow& row : shape.rows)
-        if (!row.isComment && !row.isDivider && row.fields.size() == shape.fieldCount &&
-            Explained(row, shape.decimal) > 0.0)
+        if (row.hasData && row.fields.size() == shape.fieldCount)
             rows.push_back(&row);
     std::reverse(rows.begin(), rows.end());
     constexpr std::size_t kEnough = 5;
     std::vector<ColumnKind> kinds(shape.fieldCount, ColumnKind::Empty);
-    for (const std::size_t part : {4, 2, 1}) {
+    for (const unsigned part : {4U, 2U, 1U}) {
         const std::size_t count = std::min(rows.size(), std::max(kEnough, rows.size() / part));
         const std::vector<const HeadRow*> last(rows.begin(),
                                                rows.begin() + static_cast<std::ptrdiff_t>(count));
@@ -194,10 +220,14 @@ Matches MatchRow(const TableShape& shape, const HeadRow& row) {
     return matches;
 }
 
-/// A row but for a fault: as many fields as the others, at least half of them right.
+/// A row but for a fault: as many fields as the others, at least half of them right; or nothing in
+/// any of them.
 bool IsFaultyRow(const TableShape& shape, const HeadRow& row) {
     if (row.fields.size() != shape.fieldCount)
         return false;
+    if (std::all_of(row.fields.begin(), row.fields.end(),
+                    [](const std::string& field) { return IsMissingWord(field); }))
+        return true;
     const Matches matches = MatchRow(shape, row);
     return matches.yes > 0 && matches.yes >= matches.no;
 }
@@ -246,7 +276,7 @@ std::optional<TableShape> FindShape(const TableHead& head, const ImportSettings&
         TableShape shape;
         shape.delimiter = delimiter;
         shape.commentMarks = CommentMarks(settings, delimiter);
-        shape.rows = SplitHead(head, delimiter, shape.commentMarks);
+        shape.rows = HeadSplitter(head, delimiter, shape.commentMarks).Split();
         for (const char decimal : decimals) {
             shape.decimal = decimal;
             const double weight = WeighFieldCounts(shape, &shape.fieldCount);
@@ -257,8 +287,11 @@ std::optional<TableShape> FindShape(const TableHead& head, const ImportSettings&
             }
         }
     }
-    if (best)
-        best->kinds = KindsOfColumns(*best);
+    if (!best)
+        return best;
+    for (HeadRow& row : best->rows)
+        row.hasData = !row.isComment && !row.isDivider && Explained(row, best->decimal) > 0.0;
+    best->kinds = KindsOfColumns(*best);
     return best;
 }
 

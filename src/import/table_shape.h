@@ -17,6 +17,7 @@ struct HeadRow {
     long line = 0;
     bool isComment = false; ///< the fields are those behind the comment mark
     bool isDivider = false; ///< no row and no text: "======"
+    bool hasData = false;   ///< at least one number or time
     std::string text;
     std::vector<std::string> fields;
 

@@ -35,7 +35,7 @@ class FileSource : public TextSource {
 
   private:
     struct Close {
-        void operator()(std::FILE* file) const { std::fclose(file); }
+        void operator()(std::FILE* stream) const { std::fclose(stream); }
     };
 
     std::string path;

@@ -20,7 +20,8 @@ struct TimeFit {
     /// Nearly all rows have a time, or a date that lacks its day, and half of them are whole. A row
     /// with a fault does not make it none: reading names it.
     bool IsGood() const {
-        return ok > 0.0 && ok >= 0.5 * Total() && ok + incomplete >= 0.9 * Total();
+        const bool isNearlyAll = bad <= 0.1 * Total() || (bad <= 1.0 && ok >= 3.0);
+        return ok > 0.0 && ok >= 0.5 * Total() && isNearlyAll;
     }
     /// And the times rise from row to row.
     bool Rises() const { return IsGood() && withoutRise <= 0.02 * Total(); }

@@ -1,0 +1,282 @@
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "import/line_reader.h"
+#include "unit/import/import_fixture.h"
+
+namespace ryn {
+namespace {
+
+using test::ExpectContains;
+using test::Imported;
+
+struct Refusal {
+    std::string text;
+    std::string reason; ///< the whole message behind the table's name
+    ImportOptions options = {};
+};
+
+void CheckAll(const std::vector<Refusal>& refusals) {
+    for (const Refusal& refusal : refusals) {
+        SCOPED_TRACE(refusal.text.substr(0, 200));
+        const Imported imported(refusal.text, refusal.options);
+        EXPECT_EQ(imported.status.Kind(), Fault::Input);
+        EXPECT_EQ(imported.status.Text(), "table.csv: " + refusal.reason);
+    }
+}
+
+/// A good table of daily values with one row put in its place, line 4.
+std::string WithRow(const std::string& row) {
+    return "time,q,w\n2001-01-01,1.5,0\n2001-01-02,2.5,0\n" + row +
+           "\n2001-01-04,4.5,0\n2001-01-05,5.5,0\n2001-01-06,6.5,0\n2001-01-07,7.5,0\n";
+}
+
+TEST(TableRefusal, NamesTheLineOfAValueThatIsNone) {
+    CheckAll({
+        {WithRow("2001-01-03,abc,0"), "line 4: \"abc\" in column 2 \"q\" is no number; if it marks "
+                                      "a missing value say so with --missing"},
+        {WithRow("2001-01-03,inf,0"), "line 4: \"inf\" in column 2 \"q\" is not finite"},
+        {WithRow("2001-01-03,-Infinity,0"),
+         "line 4: \"-Infinity\" in column 2 \"q\" is not finite"},
+        {WithRow("2001-01-03,1e999,0"),
+         "line 4: \"1e999\" in column 2 \"q\" is too large for a 32-bit number"},
+        {WithRow("2001-01-03,-3.5e38,0"),
+         "line 4: \"-3.5e38\" in column 2 \"q\" is too large for a 32-bit number"},
+        {WithRow("2001-01-03,\"1,234.5\",0"), "line 4: \"1,234.5\" in column 2 \"q\" is no number"},
+        {WithRow("2001-01-03,1 234,0"), "line 4: \"1 234\" in column 2 \"q\" is no number"},
+        {WithRow("2001-01-03,1.2.3,0"), "line 4: \"1.2.3\" in column 2 \"q\" is no number"},
+        {WithRow("2001-01-03,<0.5,0"),
+         "line 4: \"<0.5\" in column 2 \"q\" is a bound and not a value; leave such rows out with "
+         "--missing \"<\", or edit them"},
+        {WithRow("2001-01-03"), "line 4: ends before column 2 \"q\"; if the value is missing there "
+                                "say --missing \"\""},
+    });
+}
+
+TEST(TableRefusal, NamesTheLineOfATimeThatIsNone) {
+    CheckAll({
+        {WithRow("2001-02-30,3.5,0"),
+         "line 4: \"2001-02-30\" is no time of the form year-month-day"},
+        {WithRow("2001-01-03 25:00,3.5,0"),
+         "line 4: \"2001-01-03 25:00\" is no time of the form year-month-day"},
+        {WithRow(",3.5,0"), "line 4: \"\" is no time of the form year-month-day"},
+        {WithRow("0099-01-01,3.5,0"),
+         "line 4: \"0099-01-01\" is no time of the form year-month-day"},
+        {WithRow("Station moved upstream,,"),
+         "lines 2-3 and 5-8 look like two tables, with something else between; take that out, or "
+         "give the lines before the one to take with --skip"},
+        {WithRow("2001-01-03T00:00Z,3.5,0"),
+         "line 2: the time has no offset from UTC, and the one in line 4 has"},
+        // A faulty first row is no header.
+        {"time,q\n2001-02-30,1\n2001-03-01,2\n2001-03-02,3\n2001-03-03,4\n2001-03-04,5\n",
+         "line 2: \"2001-02-30\" is no time of the form year-month-day"},
+    });
+}
+
+TEST(TableRefusal, CountsTheRowsThatCannotBeRead) {
+    std::string text = "time,q\n";
+    for (int day = 10; day < 30; ++day)
+        text += "2001-01-" + std::to_string(day) + (day < 14 || day > 19 ? ",5.5\n" : ",5.5.5\n");
+    EXPECT_EQ(Imported(text).status.Text(),
+              "table.csv: line 6: \"5.5.5\" in column 2 \"q\" is no number (6 rows cannot be read: "
+              "lines 6, 7, 8, 9, 10, 11)");
+}
+
+TEST(TableRefusal, SaysWhatToGiveWhereTheTableLeavesItOpen) {
+    ImportOptions twoTables;
+    CheckAll({
+        {"rain\n0\n2.3\n1.3\n",
+         "no column holds dates or times; name one with --time, or give the time of the first row "
+         "and the step with --start DATE --step S"},
+        {"Year,Day,Hour,Prec\n49,1,2,0\n49,1,3,0\n49,1,24,5\n",
+         "the columns give year and day but no month; give it with --start YYYY-MM-DD (the date of "
+         "the first row)"},
+        {"d,v\n1/2/2001,1\n3/4/2001,2\n",
+         "the dates may be day-month-year or month-day-year, and no row decides; tell which with "
+         "--time-format, such as %d/%m/%Y or %m/%d/%Y"},
+        {"d;v\n2001-01-01;147,000\n2001-01-02;152,500\n2001-01-03;160,250\n",
+         "the commas in column 2 \"v\" may part decimals or thousands; if they are decimal commas "
+         "say so with --decimal , (thousands separators are not read)"},
+        {"start;end;comment\n2001-01-01;2001-02-01;\n2002-01-01;2002-02-01;\n",
+         "no column holds measured numbers; name one with --item if there is"},
+        {"rain\n0\n2.3\n\n1.3\n",
+         "line 4: is blank: without a column of times it cannot be told whether a value is missing "
+         "there; if so say --missing \"\"",
+         [] {
+             ImportOptions options;
+             options.start = "1914-01-01";
+             options.step = "1d";
+             return options;
+         }()},
+    });
+}
+
+TEST(TableRefusal, TellsStepsThatDoNotRise) {
+    CheckAll({
+        {"t,v\n2001-01-01,1\n2001-01-02,2\n2001-01-02,3\n2001-01-03,4\n",
+         "a time is repeated in line 4 (choose with --duplicates first, last or max); first: "
+         "2001-01-02 00:00:00 after 2001-01-02 00:00:00"},
+        {"t,v\n2001-01-01,1\n2001-01-02,2\n=======\n2001-01-01,3\n2001-01-02,4\n",
+         "time runs backwards in line 5 (allow it with --sort); first: 2001-01-01 00:00:00 after "
+         "2001-01-02 00:00:00"},
+    });
+}
+
+TEST(TableRefusal, RefusesTwoTablesInOneFile) {
+    std::string text = "t,v\n";
+    for (int day = 10; day < 22; ++day)
+        text += "2001-01-" + std::to_string(day) + ",5\n";
+    text += "Second gauge,of the same river\n";
+    for (int day = 10; day < 28; ++day)
+        text += "2002-01-" + std::to_string(day) + ",5\n";
+    EXPECT_EQ(Imported(text).status.Text(),
+              "table.csv: lines 2-13 and 15-32 look like two tables, with something else between; "
+              "take that out, or give the lines before the one to take with --skip");
+    ImportOptions second;
+    second.skipLines = 14;
+    EXPECT_EQ(Imported(text, second).samples.Count(), 18U);
+}
+
+TEST(TableRefusal, NamesTextBetweenRowsBehindTheHead) {
+    std::string text = "t,v\n";
+    for (int i = 0; i < 3000; ++i)
+        text += DateText(i * kMillisPerDay) + ",5\n";
+    text += "Station moved upstream\n" + DateText(3000 * kMillisPerDay) + ",5\n";
+    EXPECT_EQ(Imported(text).status.Text(),
+              "table.csv: line 3002: \"Station moved upstream\" stands between rows and is none");
+}
+
+TEST(TableRefusal, RefusesWhatIsNoTable) {
+    CheckAll({
+        {"", "is empty"},
+        {"\n\n  \n", "has no lines with text"},
+        {"time,q\n", "no rows with numbers were found"},
+        {"once upon a time\nthere was a river\n", "no rows with numbers were found"},
+        {"t,v\n2001-01-01,NA\n2001-01-02,NA\n", "no column holds measured numbers; name one with "
+                                                "--item if there is"},
+        {std::string("t,v\n2001-01-01,1\n2001-01-02,\0", 29) + "1\n",
+         "line 3: holds a NUL byte; this is no text (for UTF-16 give the encoding)"},
+    });
+}
+
+TEST(TableRefusal, NamesTheLineWhereAQuoteOpensThatNeverCloses) {
+    std::string text = "t,v,c\n2001-01-01,1,a\n2001-01-02,2,\"b\n";
+    for (int i = 0; i < 100000; ++i)
+        text += "2001-01-03,3,c\n";
+    EXPECT_EQ(Imported(text).status.Text(),
+              "table.csv: line 3: a quote opens that is never closed");
+    std::string many = "t,v,c\n2001-01-01,1,a\n2001-01-02,2,\"b\n";
+    for (int i = 0; i < 100000; ++i)
+        many += "2001-01-03,3,\"\"\"c\n"; // opens and closes in turns, and is never done
+    EXPECT_FALSE(Imported(many).status);
+}
+
+/// A line that never ends.
+class EndlessLine : public TextSource {
+  public:
+    Status Read(char* buffer, std::size_t size, std::size_t* got) override {
+        std::fill(buffer, buffer + size, 'x');
+        *got = size;
+        bytes += size;
+        return Status::Ok();
+    }
+    Status Rewind() override { return Status::Ok(); }
+    const std::string& Name() const override { return name; }
+
+    std::size_t bytes = 0;
+
+  private:
+    std::string name = "endless";
+};
+
+TEST(TableRefusal, GivesUpOnAnEndlessLineBeforeItFillsTheMemory) {
+    EndlessLine source;
+    TableSamples samples;
+    ImportReport report;
+    const Status status = ImportTable(source, {}, "x", &samples, &report);
+    EXPECT_EQ(status.Text(), "endless: line 1: longer than 1048576 bytes; this is no table");
+    EXPECT_LT(source.bytes, 4 * LineReader::kLongestLine);
+}
+
+TEST(TableRefusal, PassesOnAReadError) {
+    class Broken : public EndlessLine {
+        Status Read(char* /*buffer*/, std::size_t /*size*/, std::size_t* /*got*/) override {
+            return Status::SystemFault("the disk is gone");
+        }
+    } source;
+    TableSamples samples;
+    ImportReport report;
+    const Status status = ImportTable(source, {}, "x", &samples, &report);
+    EXPECT_EQ(status.Kind(), Fault::System);
+    EXPECT_EQ(status.Text(), "the disk is gone");
+}
+
+TEST(TableRefusal, SurvivesATableCutAtEveryByte) {
+    const std::string whole = "\xEF\xBB\xBF# no data: -99\r\ntime;\"Q \"\"x\"\"\nz [m3/s]\";c\r\n"
+                              "01.02.2001 10:00;1,5;\"a;b\"\r\n02.02.2001 10:00;-99;\r\n"
+                              "13.02.2001 24:00;3,5 e;\"c\nd\"\r\n";
+    for (std::size_t size = 0; size <= whole.size(); ++size) {
+        const Imported imported(std::string_view(whole).substr(0, size));
+        EXPECT_EQ(imported.status.IsOk(),
+                  imported.samples.Count() > 0 && imported.status.Text().empty())
+            << size;
+        EXPECT_EQ(imported.status.Text().find('\n'), std::string::npos);
+    }
+    EXPECT_EQ(Imported(whole).Samples(), "2001-02-01 10:00:00 1.5; 2001-02-14 00:00:00 3.5");
+}
+
+TEST(ImportOption, IsRefusedWithWhatItMayBe) {
+    struct Case {
+        std::string ImportOptions::*option;
+        const char* value;
+        const char* reason;
+    };
+    const Case cases[] = {
+        {&ImportOptions::delimiter, "ab",
+         "--delimiter \"ab\": one character that is no letter and no digit, or comma, semicolon, "
+         "tab, bar, blank"},
+        {&ImportOptions::decimal, ";", "--decimal \";\": \".\" or \",\""},
+        {&ImportOptions::encoding, "ebcdic",
+         "--encoding \"ebcdic\": utf-8, latin-1, windows-1252, utf-16le or utf-16be"},
+        {&ImportOptions::start, "yesterday",
+         "--start \"yesterday\": a date such as 1914-01-01 or \"1914-01-01 06:00\""},
+        {&ImportOptions::step, "1d", "--step needs --start: the date of the first row"},
+        {&ImportOptions::timeFormat, "%Q",
+         "--time-format \"%Q\": %Q is no field of a time; use fields such as %Y-%m-%d %H:%M, or "
+         "excel, unix, decimal-year, year"},
+        {&ImportOptions::timeFormat, "year-month",
+         "--time-format \"year-month\": it has no field such as %Y; use fields such as %Y-%m-%d "
+         "%H:%M, or excel, unix, decimal-year, year"},
+        {&ImportOptions::duplicates, "mean", "--duplicates \"mean\": refuse, first, last or max"},
+    };
+    for (const Case& wrong : cases) {
+        ImportOptions options;
+        options.*wrong.option = wrong.value;
+        EXPECT_EQ(Imported("t,v\n2001-01-01,1\n", options).status.Text(), wrong.reason);
+    }
+}
+
+TEST(ImportOption, IsRefusedWhereTheTableHasNoSuchColumn) {
+    const std::string text = "time,q [mm],q\n2001-01-01,1,2\n2001-01-02,3,4\n";
+    const auto refusal = [&text](const std::vector<std::string>& items, const std::string& time) {
+        ImportOptions options;
+        options.itemColumns = items;
+        if (!time.empty())
+            options.timeColumns = {time};
+        return Imported(text, options).status.Text();
+    };
+    EXPECT_EQ(refusal({"w"}, ""),
+              "table.csv: --item \"w\": no such column; there are 1 \"time\", 2 "
+              "\"q\", 3 \"q\"");
+    EXPECT_EQ(refusal({"1"}, ""), "table.csv: --item \"1\": column 1 \"time\" holds no numbers");
+    EXPECT_EQ(refusal({"2", "q"}, ""), "table.csv: --item \"q\" names a column twice");
+    EXPECT_EQ(refusal({}, "4"), "table.csv: --time \"4\": no such column; there are 1 \"time\", 2 "
+                                "\"q\", 3 \"q\"");
+    EXPECT_EQ(refusal({}, "2"), "table.csv: column 2 \"q\" does not read as time; tell its form "
+                                "with --time-format");
+}
+
+} // namespace
+} // namespace ryn
