@@ -1,7 +1,6 @@
 #include "import/clock_text.h"
 
 #include <array>
-#include <vector>
 
 #include "import/date_text.h"
 #include "import/text_cursor.h"
@@ -24,7 +23,7 @@ constexpr Zone kZones[] = {
     {"akdt", -480}, {"hst", -600}, {"ast", -240}, {"adt", -180}, {"nzst", 720}, {"nzdt", 780},
     {"jst", 540},   {"aest", 600}, {"aedt", 660}, {"awst", 480}, {"acst", 570}};
 
-/// "+01:00", "-0330", "+1".
+/// "+01:00", "-0330", "+01".
 bool ParseOffset(std::string_view text, int* minutes) {
     TextCursor cursor(text);
     const bool isNegative = cursor.Peek() == '-';
@@ -35,7 +34,7 @@ bool ParseOffset(std::string_view text, int* minutes) {
     const bool hasColon = cursor.Take(':');
     const int rest = cursor.TakeNumber(2, &minuteDigits);
     *minutes = (hours * 60 + rest) * (isNegative ? -1 : 1);
-    return hourDigits > 0 && cursor.IsAtEnd() && hours <= 14 && rest <= 59 &&
+    return hourDigits == 2 && cursor.IsAtEnd() && hours <= 14 && rest % 15 == 0 && rest < 60 &&
            (minuteDigits == 2 || (minuteDigits == 0 && !hasColon));
 }
 
@@ -74,8 +73,8 @@ bool TakeHalfOfDay(TextCursor* cursor, TimeParts* parts) {
     TextCursor ahead = *cursor;
     ahead.SkipBlanks();
     const std::string_view word = ahead.TakeWord();
-    const bool isAfternoon = IsOneOf(word, {"pm"});
-    if (!isAfternoon && !IsOneOf(word, {"am"}))
+    const bool isAfternoon = IsOneOf(word, "pm");
+    if (!isAfternoon && !IsOneOf(word, "am"))
         return true;
     if (parts->hour < 1 || parts->hour > 12)
         return false;
@@ -95,7 +94,7 @@ bool SetPlainClock(int value, int digits, TimeParts* parts) {
         parts->minute = value % 100;
     } else {
         parts->hour = value;
-        return digits == 1 || digits == 2;
+        return digits == 2;
     }
     return true;
 }
@@ -119,9 +118,14 @@ bool ParseZone(std::string_view text, int* offsetMinutes) {
 }
 
 bool ParseZoneTail(std::string_view text, TimeParts* parts) {
+    const std::size_t whole = text.size();
     text = Trimmed(text);
     if (text.empty())
         return true;
+    // Behind a blank an hour alone may be a value: "2001-01-01 10:00 -12,5".
+    constexpr std::size_t kHourAlone = 3;
+    if (text.size() < whole && text.size() == kHourAlone && text[0] == '-')
+        return false;
     int minutes = 0;
     if (!ParseZone(text, &minutes))
         return false;
@@ -135,11 +139,12 @@ bool ParseClock(std::string_view text, TimeParts* parts) {
     const int value = cursor.TakeNumber(6, &digits);
     if (digits == 0 || IsDigit(cursor.Peek()))
         return false;
+    const bool isTwelveHour = IsLetter(TextCursor(Trimmed(cursor.Rest())).Peek());
     if (cursor.Take(':') || cursor.Take('h')) {
         parts->hour = value;
         if (digits > 2 || !TakeColonClock(&cursor, parts))
             return false;
-    } else if (!SetPlainClock(value, digits, parts)) {
+    } else if (!SetPlainClock(value, isTwelveHour && digits == 1 ? 2 : digits, parts)) {
         return false;
     }
     return TakeHalfOfDay(&cursor, parts) && ParseZoneTail(cursor.Rest(), parts);
@@ -155,7 +160,7 @@ std::optional<Millis> ParseDuration(std::string_view text) {
     Millis days = 0;
     cursor.SkipBlanks();
     if (IsLetter(cursor.Peek())) {
-        if (!IsOneOf(cursor.TakeWord(), {"d", "day", "days"}))
+        if (!IsOneOf(cursor.TakeWord(), "d|day|days"))
             return std::nullopt;
         days = first;
         cursor.Take(',');
@@ -174,60 +179,19 @@ std::optional<Millis> ParseDuration(std::string_view text) {
 }
 
 int MonthOfName(std::string_view name) {
-    if (name.size() < 3)
-        return 0;
-    // By the first letters, which are enough in these languages together; the longer entries stand
-    // where three letters would not do (juin and juillet) or are not ASCII.
-    struct Month {
-        std::string_view start;
-        int number;
-    };
-    constexpr Month kMonths[] = {{"juil", 7},
-                                 {"jui", 6},
-                                 {"jan", 1},
-                                 {"gen", 1},
-                                 {"ene", 1},
-                                 {"feb", 2},
-                                 {"f\xC3\xA9v", 2},
-                                 {"fev", 2},
-                                 {"mar", 3},
-                                 {"m\xC3\xA4r", 3},
-                                 {"maa", 3},
-                                 {"mrt", 3},
-                                 {"mrz", 3},
-                                 {"apr", 4},
-                                 {"avr", 4},
-                                 {"abr", 4},
-                                 {"may", 5},
-                                 {"mai", 5},
-                                 {"mei", 5},
-                                 {"mag", 5},
-                                 {"jun", 6},
-                                 {"giu", 6},
-                                 {"jul", 7},
-                                 {"lug", 7},
-                                 {"aug", 8},
-                                 {"aou", 8},
-                                 {"ao\xC3\xBB", 8},
-                                 {"ago", 8},
-                                 {"sep", 9},
-                                 {"set", 9},
-                                 {"oct", 10},
-                                 {"okt", 10},
-                                 {"ott", 10},
-                                 {"out", 10},
-                                 {"nov", 11},
-                                 {"dec", 12},
-                                 {"dez", 12},
-                                 {"dic", 12},
-                                 {"d\xC3\xA9"
-                                  "c",
-                                  12}};
+    // By the first letters, which tell the months of these languages apart; but July goes before
+    // June ("juillet", "juin"), and so the year is gone through backwards.
+    constexpr std::array<std::string_view, 12> kStarts = {
+        "jan|gen|ene", "feb|fév|fev",    "mar|mär|maa|mrt|mrz", "apr|avr|abr", "may|mai|mei|mag",
+        "jun|jui|giu", "jul|juil|lug",   "aug|aou|aoû|ago",     "sep|set",     "oct|okt|ott|out",
+        "nov",         "dec|déc|dez|dic"};
     constexpr std::size_t kLongestName = 10;
-    const std::string lower = Lowercase(name);
-    for (const Month& month : kMonths)
-        if (lower.size() <= kLongestName && lower.compare(0, month.start.size(), month.start) == 0)
-            return month.number;
+    const std::string lower = Lowercase(name.substr(0, kLongestName + 1));
+    if (lower.size() < 3 || lower.size() > kLongestName)
+        return 0;
+    for (std::size_t month = kStarts.size(); month > 0; --month)
+        if (StartsWithOneOf(lower, kStarts[month - 1]))
+            return static_cast<int>(month);
     return 0;
 }
 

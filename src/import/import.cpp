@@ -82,6 +82,8 @@ Status Finish(const std::string& source, const ImportSettings& settings, TableSa
 
 Status ImportTable(TextSource& source, const ImportOptions& options,
                    const std::string& fallbackName, TableSamples* samples, ImportReport* report) {
+    *report = {};
+    *samples = {};
     report->source = source.Name();
     ImportSettings settings;
     Status status = ParseImportOptions(options, &settings);
@@ -99,6 +101,7 @@ Status ImportTable(TextSource& source, const ImportOptions& options,
 
 Status ImportFile(const std::string& input, const std::string& output, const ImportOptions& options,
                   ImportReport* report) {
+    *report = {};
     const std::string title = SplitPath(input).name;
     std::unique_ptr<TextSource> source;
     Status status = FileSource::Open(input, &source);

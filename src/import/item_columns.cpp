@@ -20,46 +20,11 @@ bool IsTimeColumn(const TableLayout& layout, std::size_t column) {
 bool IsLabelName(const std::string& name) {
     const std::vector<std::string> words = Words(name);
     return std::any_of(words.begin(), words.end(), [](const std::string& word) {
-        return IsOneOf(word, {"station",
-                              "stations",
-                              "stn",
-                              "site",
-                              "siteid",
-                              "id",
-                              "no",
-                              "nr",
-                              "num",
-                              "number",
-                              "nummer",
-                              "code",
-                              "cod",
-                              "cd",
-                              "wmo",
-                              "index",
-                              "idx",
-                              "row",
-                              "obs",
-                              "lat",
-                              "latitude",
-                              "lon",
-                              "long",
-                              "longitude",
-                              "elev",
-                              "elevation",
-                              "flag",
-                              "flags",
-                              "qc",
-                              "qn",
-                              "quality",
-                              "qual",
-                              "status",
-                              "grade",
-                              "gauge",
-                              "messstelle",
-                              "stationsnummer",
-                              "stationskennung",
-                              "stationid",
-                              "agency"});
+        return IsOneOf(
+            word, "station|stations|stn|site|siteid|id|no|nr|num|number|nummer|code|cod|cd|wmo|"
+                  "index|idx|row|obs|lat|latitude|lon|long|longitude|elev|elevation|flag|"
+                  "flags|qc|qn|quality|qual|status|grade|gauge|messstelle|stationid|"
+                  "stationsnummer|stationskennung|agency");
     });
 }
 

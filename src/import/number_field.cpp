@@ -15,50 +15,13 @@ namespace {
 constexpr std::string_view kUnicodeMinus = "\xE2\x88\x92";
 constexpr std::size_t kLongestNumber = 400; // digits of the largest double in full, and some
 
-const std::vector<std::string_view>& MissingWords() {
-    // The last rows: German and Dutch archives ("Lücke" in UTF-8 and in Latin-1), and the words of
-    // USGS daily files for a value that is not published.
-    static const std::vector<std::string_view> words = {"na",
-                                                        "n/a",
-                                                        "#n/a",
-                                                        "nan",
-                                                        "nan(ind)",
-                                                        "null",
-                                                        "(null)",
-                                                        "none",
-                                                        "nil",
-                                                        "nd",
-                                                        "n.d.",
-                                                        "n.a.",
-                                                        "m",
-                                                        "miss",
-                                                        "missing",
-                                                        "\\n",
-                                                        "?",
-                                                        "nodata",
-                                                        "no data",
-                                                        "l\xC3\xBC"
-                                                        "cke",
-                                                        "l\xFC"
-                                                        "cke",
-                                                        "luecke",
-                                                        "ausfall",
-                                                        "gap",
-                                                        "#value!",
-                                                        "#div/0!",
-                                                        "#ref!",
-                                                        "#num!",
-                                                        "ice",
-                                                        "eqp",
-                                                        "bkw",
-                                                        "dis",
-                                                        "mnt",
-                                                        "ssn",
-                                                        "rat",
-                                                        "tst",
-                                                        "fld"};
-    return words;
-}
+// The second part: German archives ("Lücke", also in Latin-1), spreadsheets, and the words that
+// USGS daily files put in the place of a value.
+constexpr std::string_view kMissingWords =
+    "na|n/a|n.a.|nan|nan(ind)|null|(null)|none|nil|nd|n.d.|m|miss|missing|nodata|no data|gap|\\n|?|"
+    "lücke|l\xFC"
+    "cke|luecke|ausfall|#n/a|#value!|#div/0!|#ref!|#num!|"
+    "ice|eqp|bkw|dis|mnt|ssn|rat|tst|fld";
 
 /// "-", "--", "---", ".", "..", "***", "--:--": nothing but such signs.
 bool IsOnlySigns(std::string_view field) {
@@ -112,7 +75,7 @@ class PlainNumber {
 bool IsInfinityWord(std::string_view field) {
     if (!field.empty() && (field[0] == '-' || field[0] == '+'))
         field.remove_prefix(1);
-    return IsOneOf(field, {"inf", "infinity"});
+    return IsOneOf(field, "inf|infinity");
 }
 
 /// A number out of a float's range: too large, or so small that it is zero.
@@ -154,7 +117,7 @@ bool IsMissingWord(std::string_view field) {
         return true;
     if (IsDigit(field.back()) || IsDigit(field[0])) // nearly every field of a table ends here
         return false;
-    return IsOnlySigns(field) || (field.size() <= kLongestWord && IsOneOf(field, MissingWords()));
+    return IsOnlySigns(field) || (field.size() <= kLongestWord && IsOneOf(field, kMissingWords));
 }
 
 NumberField ReadNumber(std::string_view field, char decimal) {

@@ -219,8 +219,9 @@ std::string UnitOfPreamble(const HeadRow& row) {
         return {};
     const std::vector<std::string> words = Words(std::string_view(row.text).substr(0, cut));
     if (words.empty() ||
-        !IsOneOf(words.back(), {"unit", "units", "einheit", "parametereinheit", "eenheid",
-                                "unit\xC3\xA9", "unidad", "unit\xC3\xA0", "enhet"}))
+        !IsOneOf(
+            words.back(),
+            "unit|units|einheit|parametereinheit|eenheid|unit\xC3\xA9|unidad|unit\xC3\xA0|enhet"))
         return {};
     std::string_view rest = std::string_view(row.text).substr(cut + 1);
     while (!rest.empty() &&

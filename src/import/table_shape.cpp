@@ -128,7 +128,13 @@ bool IsColumnOfDecimalCommas(const TableShape& shape) {
 double Belief(const TableShape& shape, std::size_t fieldCount) {
     if (fieldCount == 1)
         return 0.9;
-    return fieldCount == 2 && IsColumnOfDecimalCommas(shape) ? 0.8 : 1.0;
+    if (fieldCount == 2 && IsColumnOfDecimalCommas(shape))
+        return 0.8;
+    // As many titles as fields: "time value" above "2001-01-01T10:00 -1,5" has no comma.
+    const HeadRow* first = FirstLine(shape);
+    const bool hasTitles = first != nullptr && first->fields.size() == fieldCount &&
+                           Explained(*first, shape.decimal) == 0.0;
+    return hasTitles ? 1.1 : 1.0;
 }
 
 /// The number of fields that explains most, and how much it does.

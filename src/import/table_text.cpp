@@ -18,6 +18,18 @@ bool StartsWithRepeated(std::string_view line, char c) {
     return line.size() >= kMergeMark && line.find_first_not_of(c) >= kMergeMark;
 }
 
+/// Whether one of the words between bars passes a test.
+template <typename Test>
+bool AnyWord(std::string_view list, const Test& test) {
+    while (!list.empty()) {
+        const std::size_t end = std::min(list.find('|'), list.size());
+        if (test(list.substr(0, end)))
+            return true;
+        list.remove_prefix(std::min(end + 1, list.size()));
+    }
+    return false;
+}
+
 } // namespace
 
 std::string_view Trimmed(std::string_view text) {
@@ -70,9 +82,14 @@ std::vector<std::string> Words(std::string_view text) {
     return words;
 }
 
-bool IsOneOf(std::string_view text, const std::vector<std::string_view>& words) {
+bool IsOneOf(std::string_view text, std::string_view list) {
     const std::string lower = Lowercase(text);
-    return std::find(words.begin(), words.end(), lower) != words.end();
+    return AnyWord(list, [&lower](std::string_view word) { return word == lower; });
+}
+
+bool StartsWithOneOf(std::string_view lower, std::string_view list) {
+    return AnyWord(list,
+                   [lower](std::string_view word) { return lower.substr(0, word.size()) == word; });
 }
 
 bool IsSeparatorLine(std::string_view line, char delimiter) {

@@ -18,8 +18,11 @@ bool IsDigits(std::string_view text);
 /// The runs of letters of a text in lower case: "Water_Year (WY)" gives water, year, wy. A
 /// non-ASCII byte counts as a letter.
 std::vector<std::string> Words(std::string_view text);
-/// True for one of the listed words, compared in lower case.
-bool IsOneOf(std::string_view text, const std::vector<std::string_view>& words);
+/// True for one of the words of a list such as "na|n/a|no data"; the list is in lower case, and the
+/// text's ASCII letters may be in any.
+bool IsOneOf(std::string_view text, std::string_view list);
+/// True where a text in lower case begins with one of the words of such a list.
+bool StartsWithOneOf(std::string_view lower, std::string_view list);
 /// A line that only divides: no letter and no digit ("=======", "-----"), or a merge tool's mark.
 /// Decimal points, quotes and missing marks in fields do not make one: a delimiter does not occur.
 bool IsSeparatorLine(std::string_view line, char delimiter);

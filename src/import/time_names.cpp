@@ -8,90 +8,25 @@ namespace ryn {
 
 namespace {
 
-struct RoleWord {
-    std::string_view word;
+struct RoleWords {
     TimeRole role;
+    std::string_view words;
 };
 
-constexpr RoleWord kRoleWords[] = {{"year", TimeRole::Year},
-                                   {"years", TimeRole::Year},
-                                   {"yr", TimeRole::Year},
-                                   {"yyyy", TimeRole::Year},
-                                   {"yy", TimeRole::Year},
-                                   {"jaar", TimeRole::Year},
-                                   {"jahr", TimeRole::Year},
-                                   {"annee", TimeRole::Year},
-                                   {"ann\xC3\xA9"
-                                    "e",
-                                    TimeRole::Year},
-                                   {"anno", TimeRole::Year},
-                                   {"a\xC3\xB1o", TimeRole::Year},
-                                   {"ano", TimeRole::Year},
-                                   {"\xC3\xA5r", TimeRole::Year},
-                                   {"rok", TimeRole::Year},
-                                   {"wy", TimeRole::Year},
-                                   {"wateryear", TimeRole::Year},
-                                   {"hyear", TimeRole::Year},
-                                   {"vuosi", TimeRole::Year},
-                                   {"month", TimeRole::Month},
-                                   {"mon", TimeRole::Month},
-                                   {"mo", TimeRole::Month},
-                                   {"mm", TimeRole::Month},
-                                   {"mnth", TimeRole::Month},
-                                   {"mth", TimeRole::Month},
-                                   {"maand", TimeRole::Month},
-                                   {"monat", TimeRole::Month},
-                                   {"mois", TimeRole::Month},
-                                   {"mese", TimeRole::Month},
-                                   {"mes", TimeRole::Month},
-                                   {"m\xC3\xA5ned", TimeRole::Month},
-                                   {"m\xC3\xA5nad", TimeRole::Month},
-                                   {"day", TimeRole::Day},
-                                   {"dy", TimeRole::Day},
-                                   {"dd", TimeRole::Day},
-                                   {"mday", TimeRole::Day},
-                                   {"dag", TimeRole::Day},
-                                   {"tag", TimeRole::Day},
-                                   {"jour", TimeRole::Day},
-                                   {"giorno", TimeRole::Day},
-                                   {"dia", TimeRole::Day},
-                                   {"d\xC3\xAD"
-                                    "a",
-                                    TimeRole::Day},
-                                   {"doy", TimeRole::DayOfYear},
-                                   {"jday", TimeRole::DayOfYear},
-                                   {"yday", TimeRole::DayOfYear},
-                                   {"julian", TimeRole::DayOfYear},
-                                   {"dayofyear", TimeRole::DayOfYear},
-                                   {"hour", TimeRole::Hour},
-                                   {"hours", TimeRole::Hour},
-                                   {"hr", TimeRole::Hour},
-                                   {"hh", TimeRole::Hour},
-                                   {"uur", TimeRole::Hour},
-                                   {"uhr", TimeRole::Hour},
-                                   {"stunde", TimeRole::Hour},
-                                   {"heure", TimeRole::Hour},
-                                   {"ora", TimeRole::Hour},
-                                   {"hora", TimeRole::Hour},
-                                   {"minute", TimeRole::Minute},
-                                   {"minutes", TimeRole::Minute},
-                                   {"min", TimeRole::Minute},
-                                   {"mn", TimeRole::Minute},
-                                   {"mi", TimeRole::Minute},
-                                   {"minuut", TimeRole::Minute},
-                                   {"minuto", TimeRole::Minute},
-                                   {"second", TimeRole::Second},
-                                   {"seconds", TimeRole::Second},
-                                   {"sec", TimeRole::Second},
-                                   {"ss", TimeRole::Second},
-                                   {"y", TimeRole::Year},
-                                   {"m", TimeRole::Month},
-                                   {"d", TimeRole::Day},
-                                   {"h", TimeRole::Hour}};
+// In English, German, Dutch, French, Italian, Spanish, Portuguese and the Nordic languages.
+constexpr RoleWords kRoles[] = {
+    {TimeRole::Year, "year|years|yr|yyyy|yy|y|jaar|jahr|année|annee|anno|año|ano|år|rok|vuosi|wy|"
+                     "wateryear|hyear"},
+    {TimeRole::Month, "month|mon|mo|mm|m|mnth|mth|maand|monat|mois|mese|mes|måned|månad"},
+    {TimeRole::Day, "day|dy|dd|d|mday|dag|tag|jour|giorno|dia|día"},
+    {TimeRole::DayOfYear, "doy|jday|yday|julian|dayofyear"},
+    {TimeRole::Hour, "hour|hours|hr|hh|h|uur|uhr|stunde|heure|ora|hora"},
+    {TimeRole::Minute, "minute|minutes|min|mn|mi|minuut|minuto"},
+    {TimeRole::Second, "second|seconds|sec|ss"}};
 
 std::optional<TimeRole> RoleOfWord(std::string_view word) {
-    for (const RoleWord& known : kRoleWords)
-        if (known.word == word)
+    for (const RoleWords& known : kRoles)
+        if (IsOneOf(word, known.words))
             return known.role;
     return std::nullopt;
 }
@@ -145,10 +80,9 @@ bool IsTimeName(const std::string& name) {
     const std::vector<std::string> words = Words(name);
     return std::any_of(words.begin(), words.end(), [](const std::string& word) {
         return IsOneOf(word,
-                       {"date",      "time",    "datetime",   "timestamp",    "datum", "zeit",
-                        "zeitpunkt", "tijd",    "fecha",      "data",         "dato",  "heure",
-                        "hora",      "uhrzeit", "dt",         "tm",           "tmstp", "epoch",
-                        "yyyymmdd",  "yyyymm",  "yyyymmddhh", "yyyymmddhhmm", "hhmm"});
+                       "date|time|datetime|timestamp|datum|zeit|zeitpunkt|uhrzeit|tijd|fecha|data|"
+                       "dato|heure|hora|dt|tm|tmstp|epoch|hhmm|yyyymm|yyyymmdd|yyyymmddhh|"
+                       "yyyymmddhhmm");
     });
 }
 

@@ -59,8 +59,8 @@ bool TakeZone(TextCursor* cursor, TimeParts* parts) {
 
 bool TakeHalfOfDay(TextCursor* cursor, TimeParts* parts) {
     const std::string_view word = cursor->TakeWord();
-    const bool isAfternoon = IsOneOf(word, {"pm"});
-    if ((!isAfternoon && !IsOneOf(word, {"am"})) || parts->hour < 1 || parts->hour > 12)
+    const bool isAfternoon = IsOneOf(word, "pm");
+    if ((!isAfternoon && !IsOneOf(word, "am")) || parts->hour < 1 || parts->hour > 12)
         return false;
     parts->hour = parts->hour % 12 + (isAfternoon ? 12 : 0);
     return true;

@@ -88,7 +88,7 @@ bool ReadElapsedTitle(const ColumnLayout& column, TimeLayout* time) {
     time->isRelative = since == std::string::npos;
     if (time->isRelative)
         return !column.unit.empty() && time->elapsedUnit > 0 &&
-               IsOneOf(column.name, {"time", "t", "elapsed", "elapsed time", "zeit", "tijd"});
+               IsOneOf(column.name, "time|t|elapsed|elapsed time|zeit|tijd");
     constexpr std::size_t kSinceSize = 7;
     TimeParts parts;
     return time->elapsedUnit > 0 &&

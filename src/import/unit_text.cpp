@@ -1,7 +1,6 @@
 #include "import/unit_text.h"
 
 #include <algorithm>
-#include <vector>
 
 #include "import/table_text.h"
 
@@ -9,31 +8,14 @@ namespace ryn {
 
 namespace {
 
-const std::vector<std::string_view>& UnitWords() {
-    static const std::vector<std::string_view> words = {
-        "m",          "mm",          "cm",          "dm",     "km",         "um",
-        "meter",      "meters",      "metre",       "metres", "millimeter", "millimeters",
-        "millimetre", "millimetres", "centimeters", "ft",     "feet",       "foot",
-        "in",         "inch",        "inches",      "mi",     "nmi",        "nm",
-        "l",          "liter",       "litre",       "ml",     "s",          "sec",
-        "second",     "seconds",     "min",         "minute", "minutes",    "h",
-        "hr",         "hour",        "hours",       "d",      "dy",         "day",
-        "days",       "mo",          "mon",         "month",  "months",     "yr",
-        "year",       "years",       "mn",          "a",      "cfs",        "cms",
-        "cumec",      "cumecs",      "cusec",       "cusecs", "mcm",        "degc",
-        "degf",       "degk",        "deg",         "degree", "degrees",    "celsius",
-        "fahrenheit", "kelvin",      "c",           "f",      "k",          "pa",
-        "hpa",        "kpa",         "mb",          "mbar",   "bar",        "dbar",
-        "psi",        "atm",         "kg",          "g",      "mg",         "ug",
-        "t",          "n",           "kn",          "w",      "kw",         "mw",
-        "j",          "mj",          "kj",          "v",      "mv",         "kt",
-        "kts",        "knot",        "knots",       "mph",    "kmh",        "kph",
-        "psu",        "ppt",         "ppm",         "ntu",    "rad",        "hz",
-        "percent",    "cubic",       "square",      "per",    "ha",         "acre",
-        "af",         "umol",        "mol",         "us",     "ms",         "okta",
-        "oktas",      "octas"};
-    return words;
-}
+constexpr std::string_view kUnitWords =
+    "m|mm|cm|dm|km|um|meter|meters|metre|metres|millimeter|millimeters|millimetre|millimetres|"
+    "centimeters|ft|feet|foot|in|inch|inches|mi|nmi|nm|l|liter|litre|ml|s|sec|second|seconds|min|"
+    "minute|minutes|mn|h|hr|hour|hours|d|dy|day|days|mo|mon|month|months|a|yr|year|years|cfs|cms|"
+    "cumec|cumecs|cusec|cusecs|mcm|c|f|k|deg|degree|degrees|degc|degf|degk|degt|celsius|fahrenheit|"
+    "kelvin|pa|hpa|kpa|mb|mbar|bar|dbar|psi|atm|kg|g|mg|ug|t|n|kn|w|kw|mw|j|kj|mj|v|mv|kt|kts|knot|"
+    "knots|mph|kmh|kph|psu|ppt|ppm|ntu|rad|hz|percent|cubic|square|per|ha|acre|af|mol|umol|us|ms|"
+    "okta|oktas|octas";
 
 /// Degree signs, superscripts and the middle dot taken away, which units have and words do not.
 std::string WithoutUnitSigns(std::string_view text) {
@@ -70,7 +52,7 @@ bool LooksLikeUnit(std::string_view text) {
     const std::vector<std::string> words = Words(plain);
     return onlyUnitSigns && !words.empty() &&
            std::all_of(words.begin(), words.end(),
-                       [](const std::string& word) { return IsOneOf(word, UnitWords()); });
+                       [](const std::string& word) { return IsOneOf(word, kUnitWords); });
 }
 
 void SplitNameAndUnit(std::string_view title, std::string* name, std::string* unit) {
