@@ -55,7 +55,7 @@ Status WriteTable(DataFile& file, const std::vector<int>& itemNumbers, const Sin
                   ProgressPort& progress) {
     constexpr std::size_t kPiece = std::size_t{1} << 16;
     std::string text = Heading(file, itemNumbers);
-    const Status walked = file.Walk(itemNumbers, [&](const DataStep& step) {
+    Status walked = file.Walk(itemNumbers, [&](const DataStep& step) {
         AppendStep(step, text);
         if (text.size() < kPiece)
             return true;

@@ -163,7 +163,7 @@ Status ReadSeriesInfo(const std::string& path, ProgressPort& progress, SeriesInf
         read.items.push_back(std::move(extent));
     }
     const std::vector<int> numbers = file.PlainItems();
-    const Status walked = file.Walk(numbers, [&](const DataStep& step) {
+    Status walked = file.Walk(numbers, [&](const DataStep& step) {
         ExtendTimes(read, step.date);
         for (std::size_t i = 0; i < numbers.size(); ++i)
             Extend(read.items[static_cast<std::size_t>(numbers[i] - 1)], step.date, step.values[i]);
