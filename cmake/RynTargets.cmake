@@ -74,3 +74,10 @@ function(ryn_core_library)
     endif()
     install(TARGETS ryncore LIBRARY DESTINATION lib)
 endfunction()
+
+# For every program: what its sanitizer build needs besides.
+function(ryn_program name)
+    if(RYN_SANITIZE)
+        target_sources(${name} PRIVATE ${CMAKE_SOURCE_DIR}/tests/support/leak_suppressions.cpp)
+    endif()
+endfunction()
