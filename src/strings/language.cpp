@@ -11,9 +11,13 @@ std::atomic<Language> current{Language::English};
 
 } // namespace
 
-Language CurrentLanguage() { return current.load(); }
+Language CurrentLanguage() {
+    return current.load();
+}
 
-void SetLanguage(Language language) { current.store(language); }
+void SetLanguage(Language language) {
+    current.store(language);
+}
 
 Language LanguageOfLocale(std::string_view localeName) {
     const std::string_view code = localeName.substr(0, localeName.find_first_of("_.@"));
