@@ -36,6 +36,7 @@ def examples(text):
 def main():
     programs, document = pathlib.Path(sys.argv[1]).resolve(), pathlib.Path(sys.argv[2])
     environment = dict(os.environ, LC_ALL="C", PATH=f"{programs}:{os.environ['PATH']}")
+    environment["LSAN_OPTIONS"] = "print_suppressions=0"  # a sanitized build prints them else
     faults = 0
     all_examples = examples(document.read_text(encoding="utf-8"))
     with tempfile.TemporaryDirectory(prefix="ryn-document-") as name:

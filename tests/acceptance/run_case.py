@@ -26,6 +26,7 @@ def run(programs, case, here):
     """Exit code and output of the case's script in the directory `here`."""
     source = case.resolve().parents[2]
     environment = dict(os.environ, LC_ALL="C", RYN_SOURCE=str(source))
+    environment["LSAN_OPTIONS"] = "print_suppressions=0"  # a sanitized build prints them else
     environment["PATH"] = f"{programs.resolve()}:{os.environ['PATH']}"
     if (case / "input").is_dir():
         shutil.copytree(case / "input", here, dirs_exist_ok=True)
