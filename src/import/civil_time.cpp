@@ -41,6 +41,7 @@ TimeResult DayOf(const TimeParts& parts, const TimeDefaults& defaults, Millis* s
     const int year = parts.year >= 0 ? parts.year : defaults.year;
     if (year < kFirstYear || year > kLastYear)
         return TimeResult::Bad;
+    // A day of the year needs no month; a month beside it (some archives give both) says the same.
     if (parts.dayOfYear >= 0) {
         if (parts.dayOfYear < 1 || parts.dayOfYear > (IsLeapYear(year) ? 366 : 365))
             return TimeResult::Bad;
@@ -51,6 +52,7 @@ TimeResult DayOf(const TimeParts& parts, const TimeDefaults& defaults, Millis* s
     const int day = parts.day >= 0 ? parts.day : defaults.day;
     if (month > 12 || day > 31)
         return TimeResult::Bad;
+    // Archives of historic floods write what they know: "1895-07-00" is July of that year.
     if (month == 0 || day == 0)
         return TimeResult::Incomplete;
     if (day > DaysInMonth(year, month))
@@ -67,6 +69,8 @@ bool ClockOf(const TimeParts& parts, Millis* sinceMidnight) {
     const int millisecond = std::max(parts.millisecond, 0);
     *sinceMidnight =
         hour * kMillisPerHour + minute * kMillisPerMinute + second * kMillisPerSecond + millisecond;
+    // 24:00:00 is the last moment that a day can be written with; a leap second has no place in a
+    // calendar of equal days.
     return minute <= 59 && second <= 59 && *sinceMidnight <= kMillisPerDay;
 }
 
@@ -84,6 +88,7 @@ TimeResult MomentOf(const TimeParts& parts, const TimeDefaults& defaults, Millis
         return result;
     if (!ClockOf(parts, &clock))
         return TimeResult::Bad;
+    // Local time with daylight saving has an hour twice; in UTC the two are apart.
     *moment = day + clock - parts.offsetMinutes.value_or(0) * kMillisPerMinute;
     return IsInCalendar(*moment) ? TimeResult::Ok : TimeResult::Bad;
 }
@@ -97,6 +102,9 @@ std::optional<Millis> MomentOfDecimalYear(double year) {
         return std::nullopt;
     const int whole = static_cast<int>(year);
     const double days = IsLeapYear(whole) ? 366.0 : 365.0;
+    // Eleven decimals of a year are a third of a millisecond, six are half a minute: a second is
+    // what the system resolves, and rounding gives back whole minutes that a program has turned
+    // into years.
     const auto seconds = static_cast<Millis>(std::llround((year - whole) * days * 86400.0));
     return StartOfDay(whole, 1, 1) + seconds * kMillisPerSecond;
 }
@@ -132,6 +140,7 @@ std::optional<TimeStep> ParseTimeStep(std::string_view text) {
     while (digits < text.size() && (IsDigit(text[digits]) || text[digits] == '.'))
         ++digits;
     const std::optional<double> number = ParseDouble(text.substr(0, digits));
+    // Beyond it no axis of two steps fits into the calendar.
     constexpr double kMost = 1e6;
     if (!number || !(*number > 0.0 && *number <= kMost * 1000))
         return std::nullopt;
@@ -169,6 +178,7 @@ std::optional<Millis> Advance(Millis start, TimeStep step, std::int64_t count) {
         const Millis moment = start + count * step.millis;
         return IsInCalendar(moment) ? std::optional(moment) : std::nullopt;
     }
+    // Before the multiplication, which could overflow.
     if (count > kLastYear * 12 / step.months)
         return std::nullopt;
     const std::chrono::year_month_day date = DateOf(start);

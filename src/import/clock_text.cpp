@@ -34,6 +34,7 @@ bool ParseOffset(std::string_view text, int* minutes) {
     const bool hasColon = cursor.Take(':');
     const int rest = cursor.TakeNumber(2, &minuteDigits);
     *minutes = (hours * 60 + rest) * (isNegative ? -1 : 1);
+    // Zones in use are multiples of a quarter of an hour, up to 14 hours from UTC.
     return hourDigits == 2 && cursor.IsAtEnd() && hours <= 14 && rest % 15 == 0 && rest < 60 &&
            (minuteDigits == 2 || (minuteDigits == 0 && !hasColon));
 }
@@ -78,6 +79,7 @@ bool TakeHalfOfDay(TextCursor* cursor, TimeParts* parts) {
         return true;
     if (parts->hour < 1 || parts->hour > 12)
         return false;
+    // 12 AM is midnight, 12 PM is noon.
     parts->hour = parts->hour % 12 + (isAfternoon ? 12 : 0);
     *cursor = ahead;
     return true;
@@ -170,6 +172,7 @@ std::optional<Millis> ParseDuration(std::string_view text) {
         first = cursor.TakeNumber(2, &digits);
     }
     TimeParts parts;
+    // Seconds are asked for: "12:30" alone is a time of day.
     if (digits == 0 || !cursor.Take(':') || !TakeColonClock(&cursor, &parts) || !cursor.IsAtEnd() ||
         parts.second < 0 || parts.minute > 59 || parts.second > 59)
         return std::nullopt;

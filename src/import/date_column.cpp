@@ -59,7 +59,7 @@ std::optional<TimeRole> ClockRole(const TimeSearch& search, std::size_t column) 
         return TimeRole::Clock;
     const std::vector<std::string> words = Words(layout.name);
     const bool isNamed =
-        RoleOfName(layout.name) == TimeRole::Hour ||
+        (layout.name.size() > 1 && RoleOfName(layout.name) == TimeRole::Hour) ||
         (!words.empty() && IsOneOf(words.back(), "time|tm|zeit|uhrzeit|tijd|heure|hora|hhmm"));
     if (!isNamed || layout.kind != ColumnKind::Number)
         return std::nullopt;

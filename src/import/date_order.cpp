@@ -20,6 +20,7 @@ void Narrow(const std::vector<std::string_view>& fields, TimeLayout probe,
         if (TimeReader(probe).Read(fields, &moment) == TimeResult::Ok)
             reading.push_back(form);
     }
+    // A row that no form reads decides nothing; reading will name it.
     if (!reading.empty())
         *forms = std::move(reading);
 }

@@ -26,6 +26,7 @@ struct DateTokens {
 
 bool TakeToken(TextCursor* cursor, DateToken* token) {
     if (IsDigit(cursor->Peek())) {
+        // Five digits and more are no part of a separated date.
         token->value = cursor->TakeNumber(4, &token->digits);
         return !IsDigit(cursor->Peek());
     }
@@ -40,6 +41,7 @@ char TakeDateSeparator(TextCursor* cursor) {
     if (c != '-' && c != '/' && c != '.' && c != ' ' && c != ',')
         return '\0';
     cursor->Skip();
+    // "31. Dezember 2001", "Dec 31, 2001".
     if (c == '.' || c == ',')
         cursor->SkipBlanks();
     return c;
@@ -155,6 +157,7 @@ TimeResult ParseCompact(std::string_view text, DateForm form, TimeParts* parts) 
     parts->year = TwoDigits(text, year) * 100 + TwoDigits(text, year + 2);
     parts->month = TwoDigits(text, yearFirst ? 4 : 2);
     parts->day = TwoDigits(text, yearFirst ? 6 : 0);
+    // Here already, so that a column of long numbers is not taken for dates.
     if (parts->month > 12 || parts->day > 31)
         return TimeResult::Bad;
     if (digits >= 10)
@@ -180,6 +183,7 @@ TimeResult ParseYearMonth(std::string_view text, TimeParts* parts) {
         return date.token[0].digits == 4 ? TimeResult::Incomplete : TimeResult::Bad;
     if (date.count != 2)
         return TimeResult::Bad;
+    // Either order is clear: only one of the two has four digits.
     const bool yearFirst = date.token[0].digits == 4;
     const DateToken& year = date.token[yearFirst ? 0 : 1];
     const DateToken& month = date.token[yearFirst ? 1 : 0];

@@ -14,6 +14,8 @@ namespace ryn {
 namespace {
 
 constexpr std::string_view kStart = "[IDT;*DIF*";
+// The format's code for no value, and the quality that goes with it. Interpolated and doubtful
+// values have other qualities and are taken, as the archive itself publishes them.
 constexpr std::string_view kMissingValue = "999999999";
 constexpr std::string_view kMissingQuality = "99";
 
@@ -79,6 +81,8 @@ Status DifReader::TakePeriod(const FieldList& fields) {
         return Fail("TYD gives no period and step that can be read");
     first = *start;
     step = *every;
+    // The count is the only check that there is: a value lost in transmission would shift all that
+    // follow it by one step.
     announced = (*end - *start) / step.millis + 1;
     taken = 0;
     hasPeriod = true;
@@ -92,6 +96,7 @@ Status DifReader::TakeHeader(std::string_view text) {
     ImportedItem& item = report->items[0];
     if (fields[0] == "TYD")
         return TakePeriod(fields);
+    // TE is an equidistant series. The others have layouts of their own, which would be misread.
     if (fields[0] == "TYP" && fields[1] != "TE")
         return Fail("series of type " + std::string(fields[1]) +
                     " carry a time with each value and are not read; only TE is");
@@ -113,9 +118,10 @@ Status DifReader::CloseBlock() {
 }
 
 Status DifReader::TakeBlockName(std::string_view text) {
-    const Status status = CloseBlock();
+    Status status = CloseBlock();
     if (!status)
         return status;
+    // Each series begins with its own description. Several periods of one series share it.
     if (text.substr(0, 4) == "[W3H" && ++headers > 1)
         return Fail("a second series begins; only one is imported at a time");
     if (text.substr(0, 4) == "[WRD") {
@@ -131,6 +137,7 @@ Status DifReader::TakeValue(std::string_view text) {
     const std::string_view number = Trimmed(text.substr(0, slash));
     const std::string_view quality =
         slash == std::string_view::npos ? std::string_view() : Trimmed(text.substr(slash + 1));
+    // Missing values count for the time of those behind them.
     const std::optional<Millis> moment = Advance(first, step, taken++);
     const NumberField field = ReadNumber(number, '.');
     ++report->rowsRead;
@@ -153,7 +160,7 @@ Status DifReader::TakeValue(std::string_view text) {
 Status DifReader::TakeValues(std::string_view text) {
     while (!Trimmed(text).empty()) {
         const std::size_t end = text.find(':');
-        const Status status = TakeValue(Trimmed(text.substr(0, end)));
+        Status status = TakeValue(Trimmed(text.substr(0, end)));
         if (!status || end == std::string_view::npos)
             return status;
         text.remove_prefix(end + 1);

@@ -34,8 +34,10 @@ class QuotedRecord {
     bool TakeField() {
         if (delimiter != kBlanks)
             position = SkipBlanks(record, position, delimiter);
+        // A quote within a field is a plain character: 5" pipes, minutes of arc.
         if (position < record.size() && record[position] == '"' && !TakeQuoted())
             return false;
+        // Also behind a closing quote: "abc"def is one field.
         while (position < record.size() && !Divides(record[position], delimiter))
             storage->push_back(record[position++]);
         return true;
@@ -77,6 +79,7 @@ class QuotedRecord {
 
 bool FieldList::Split(std::string_view record, char delimiter) {
     fields.clear();
+    // Most rows have no quotes; their fields are views into the row, and nothing is copied.
     if (!record.empty() && std::memchr(record.data(), '"', record.size()) != nullptr)
         return SplitQuoted(record, delimiter);
     SplitUnquoted(record, delimiter);
@@ -94,6 +97,7 @@ void FieldList::SplitUnquoted(std::string_view record, char delimiter) {
 void FieldList::SplitPlain(std::string_view record, char delimiter) {
     for (std::size_t start = 0;;) {
         const std::size_t end = record.find(delimiter, start);
+        // Fixed-width exports pad their fields.
         fields.push_back(Trimmed(record.substr(start, end - start)));
         if (end == std::string_view::npos)
             return;
@@ -124,6 +128,7 @@ bool FieldList::SplitQuoted(std::string_view record, char delimiter) {
         if (walk.IsAtEnd())
             return true;
         walk.SkipDelimiter();
+        // Blanks at the end of a line are no empty field; a comma there is one.
         if (walk.IsAtEnd() && delimiter == kBlanks)
             return true;
     }

@@ -40,6 +40,8 @@ Status CheckOtherRuns(const TableShape& shape, const std::vector<RowRun>& runs,
         if (run.first >= chosen.first)
             break;
         constexpr std::size_t kMany = 10;
+        // Taking the longer of two tables without a word would lose the other; a few lines are
+        // told, not refused, since gauge histories stand in many headers.
         if (run.count > kMany || run.count * 5 > chosen.count)
             return Status::InputFault("lines " + LinesText(shape, run) + " and " +
                                       LinesText(shape, chosen) +
@@ -108,7 +110,8 @@ void NoteTimeRules(const SampleRows& rows, const ImportSettings& settings, Table
     const bool isMonth =
         (isDate && (time.form == DateForm::YearMonth || time.form == DateForm::CompactYearMonth)) ||
         (time.columns.size() == 2 && time.columns[1].role == TimeRole::Month);
-    if (time.source != TimeSource::Columns || settings.start || !(isYear || isMonth))
+    if (time.source != TimeSource::Columns || settings.start || !(isYear || isMonth) ||
+        !layout->months.empty())
         return;
     layout->notes.emplace_back(isYear ? "years alone: each value is placed at 1 January"
                                       : "months alone: each value is placed at the first day");
@@ -152,11 +155,15 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
     if (run.count == 0)
         return Status::InputFault("no rows with numbers were found");
     FindNames(shape, run.first, layout);
-    Status status = FindTime(SampleRows(shape, run, layout->columns), settings, layout);
+    const SampleRows first(shape, run, layout->columns);
+    if (first.Count() == 0) // nothing but numbers with marks
+        return Status::InputFault("no rows with numbers were found");
+    Status status = FindTime(first, settings, layout);
     if (!status)
         return status;
     const TimeLayout& time = layout->time;
     std::vector<RowRun> runs = byKind;
+    // By their time alone: a row with a bad value still belongs to the table, and reading names it.
     if (time.source != TimeSource::StartAndStep) {
         runs = FindRuns(shape, [&time](const HeadRow& row) { return ReadsAsTime(time, row); });
         run = LongestRun(runs);
@@ -166,14 +173,15 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
         return status;
     if (time.source != TimeSource::StartAndStep)
         run.first = WithFaultyRowsBefore(shape, time, run.first);
+    // Again, since the rows may start elsewhere than the kinds of their fields suggested.
     FindNames(shape, run.first, layout);
     ReadPreamble(shape, run.first, layout);
     layout->dataLine = shape.rows[run.first].line;
     const SampleRows rows(shape, run, layout->columns);
     if (rows.Count() == 0)
         return Status::InputFault("no rows with numbers were found");
-    NoteTimeRules(rows, settings, layout);
     status = ChooseItems(rows, settings, layout);
+    NoteTimeRules(rows, settings, layout);
     KeepPreview(rows, layout);
     if (status && layout->decimal == ',' && !settings.decimal && IsDecimalInDoubt(rows, *layout))
         return Status::InputFault("the commas in column " + ColumnTitle(*layout, layout->items[0]) +
@@ -196,7 +204,7 @@ Status GuessFromHead(const TableHead& head, const ImportSettings& settings, Tabl
     guessed.delimiter = shape->delimiter;
     guessed.decimal = shape->decimal;
     guessed.commentMarks = shape->commentMarks;
-    const Status status = LayOut(*shape, settings, &guessed);
+    Status status = LayOut(*shape, settings, &guessed);
     if (status)
         *layout = std::move(guessed);
     return status;
@@ -209,6 +217,7 @@ Status GuessLayout(TextSource& source, const ImportSettings& settings, TableLayo
     Status status = FindEncoding(source, &encoding);
     if (!status)
         return status;
+    // The bytes are looked at even so: an empty table is told here.
     encoding = settings.encoding.value_or(encoding);
     // A preamble may be longer than the first look; then the next one reaches further.
     constexpr HeadLimits kLooks[] = {{2000, 4 * kMegabyte}, {50000, 16 * kMegabyte}};
@@ -219,6 +228,7 @@ Status GuessLayout(TextSource& source, const ImportSettings& settings, TableLayo
             return status;
         if (head.lines.empty())
             return Status::InputFault(source.Name() + ": has no lines with text");
+        // A fault in the first look may only mean that the rows begin later.
         status = GuessFromHead(head, settings, layout);
         if (status || head.isWhole)
             break;

@@ -17,6 +17,7 @@ namespace ryn {
 
 namespace {
 
+/// The first bytes tell the files of other kinds from tables.
 Status ReadStart(TextSource& source, std::string* start) {
     std::array<char, 64> buffer{};
     std::size_t got = 0;
@@ -33,11 +34,24 @@ void NameItems(const ImportSettings& settings, const std::string& fallbackName,
         if (!settings.name.empty() && report->items.size() == 1)
             item.name = settings.name;
         if (item.name.empty())
+            // A series needs a name on plots; the table's own file name is what its owner knows it
+            // by.
             item.name = report->items.size() == 1 ? fallbackName
                                                   : fallbackName + " " + std::to_string(i + 1);
         if (!settings.unit.empty())
             item.unit = settings.unit;
     }
+}
+
+void DescribeItems(const TableLayout& layout, ImportReport* report) {
+    for (const std::size_t item : layout.items) {
+        const ColumnLayout& column = layout.columns[item];
+        report->items.push_back({ColumnTitle(layout, item), column.name, column.unit, {}});
+    }
+    if (layout.months.empty())
+        return;
+    report->items[0].column += " to " + ColumnTitle(layout, layout.months.back());
+    report->items[0].name.clear(); // "Jan" is not the item's name
 }
 
 Status ReadPlainTable(TextSource& source, const ImportSettings& settings, TableSamples* samples,
@@ -47,13 +61,12 @@ Status ReadPlainTable(TextSource& source, const ImportSettings& settings, TableS
     Status status = GuessLayout(source, settings, &layout);
     if (!status)
         return status;
-    for (const std::size_t item : layout.items)
-        report->items.push_back(
-            {ColumnTitle(layout, item), layout.columns[item].name, layout.columns[item].unit, {}});
+    DescribeItems(layout, report);
     for (const std::size_t other : OtherItems(layout))
         report->otherItems.push_back(ColumnTitle(layout, other));
     report->notes = layout.notes;
     status = ReadRows(source, layout, settings.missing, samples, report);
+    // Only the whole series shows which values stand apart.
     if (status && settings.missing.searchCodes)
         TakeOutCodes(layout, samples, report);
     return status;
@@ -72,6 +85,8 @@ Status NoValues(const std::string& source, const ImportReport& report) {
 
 Status Finish(const std::string& source, const ImportSettings& settings, TableSamples* samples,
               ImportReport* report) {
+    // Before the order is judged: a time that is repeated without a value, as archives do to fill
+    // up, is no duplicate.
     DropMissing(samples, report);
     if (samples->Count() == 0)
         return NoValues(source, *report);

@@ -7,6 +7,7 @@ namespace ryn {
 
 namespace {
 
+/// One line that names the option, what was given, and what it may be.
 Status Unknown(const std::string& option, const std::string& value, const std::string& allowed) {
     return Status::InputFault("--" + option + " " + Quoted(value) + ": " + allowed);
 }
@@ -26,6 +27,8 @@ Status ParseDelimiter(const std::string& text, std::optional<char>* delimiter) {
             *delimiter = known.character;
     if (text.size() == 1)
         *delimiter = text[0];
+    // A letter or a digit would cut numbers and names, and the quote has its own meaning. Several
+    // characters that name nothing leave the delimiter open, and come here as a quote.
     const char c = delimiter->value_or('"');
     if (c == '"' || IsDigit(c) || IsLetter(c) ||
         (static_cast<unsigned char>(c) < 0x20 && c != '\t'))
@@ -44,6 +47,7 @@ Status ParseDecimal(const std::string& text, std::optional<char>* decimal) {
     return Status::Ok();
 }
 
+/// Words for the forms that no pattern can express; everything else is a pattern.
 Status ParseTimeFormat(const std::string& text, ImportSettings* settings) {
     struct Name {
         std::string_view name;
@@ -71,6 +75,7 @@ Status ParseTimeFormat(const std::string& text, ImportSettings* settings) {
     return Status::Ok();
 }
 
+/// The one date that is typed by hand is read in one form, so that it cannot be misread.
 Status ParseStart(const std::string& text, std::optional<Millis>* start) {
     if (text.empty())
         return Status::Ok();
@@ -115,12 +120,14 @@ Status ParseDuplicates(const std::string& text, DuplicateRule* rule) {
 }
 
 void ParseMissing(const std::vector<std::string>& codes, MissingRules* rules) {
+    // Who gives codes knows them: looking for others as well could take away values.
     rules->searchCodes = codes.empty();
     for (const std::string& code : codes) {
         const std::string text(Trimmed(code));
         if (codes.size() == 1 && Lowercase(text) == "none")
             continue;
         rules->texts.push_back(text);
+        // A code that is a number is compared as one, so that -9999 finds "-9999.000000" too.
         const NumberField number = ReadNumber(text, '.');
         if (number.kind == NumberKind::Value)
             rules->numbers.push_back(number.value);
@@ -138,6 +145,7 @@ Status ParseEncoding(const std::string& text, std::optional<TextEncoding>* encod
 
 } // namespace
 
+/// The settings are taken over only when every option is understood.
 Status ParseImportOptions(const ImportOptions& options, ImportSettings* settings) {
     ImportSettings parsed;
     parsed.timeColumns = options.timeColumns;

@@ -10,6 +10,8 @@ namespace ryn {
 
 namespace {
 
+// Every line begins with a fixed word and a colon, so that scripts can pick what they need, and is
+// whole in itself, so that a dialog can show it alone.
 using Lines = std::vector<std::string>;
 
 std::string Joined(const std::vector<std::string>& texts) {
@@ -23,6 +25,7 @@ std::string Times(long count) {
     return count == 1 ? "once" : std::to_string(count) + " times";
 }
 
+/// The columns in the order in which they are read, and the form of the date among them.
 std::string FormOfTime(const TableLayout& layout) {
     const TimeLayout& time = layout.time;
     if (time.source == TimeSource::StartAndStep)
@@ -38,6 +41,7 @@ std::string FormOfTime(const TableLayout& layout) {
 }
 
 void AddLayout(const TableLayout& layout, Lines* lines) {
+    // What was guessed comes first: a wrong guess explains all that follows.
     std::string text = EncodingName(layout.encoding) + ", " +
                        std::to_string(layout.columns.size()) +
                        (layout.columns.size() == 1 ? " column" : " columns");
@@ -66,6 +70,7 @@ void AddItems(const ImportReport& report, Lines* lines) {
 }
 
 void AddMissing(const ImportReport& report, Lines* lines) {
+    // Codes that were announced but never occur are told too: a user may have expected them.
     for (const OccurredText& code : report.missing) {
         const std::string name = code.text.empty() ? "empty" : Quoted(code.text);
         lines->push_back("missing: " + name + ", " + Times(code.count) +
@@ -117,6 +122,8 @@ std::string SpanText(const ImportReport& report) {
 
 void DroppedRows::Add(long line) {
     ++count;
+    // Rows do not come in the order of their lines: codes are found after the words for missing
+    // values.
     if (firstLines.size() == kMostLines && line >= firstLines.back())
         return;
     firstLines.insert(std::upper_bound(firstLines.begin(), firstLines.end(), line), line);
@@ -152,6 +159,7 @@ std::vector<std::string> ReportLines(const ImportReport& report) {
     for (const DroppedRows& rows : report.dropped)
         lines.push_back("left out: " + std::to_string(rows.count) + " " + ReasonText(rows.reason) +
                         " (line " + LineList(rows.firstLines, rows.count) + ")");
+    // Without samples nothing was written, and the fault says why.
     if (report.samples > 0)
         lines.push_back("written: " + std::to_string(report.samples) + " samples, " +
                         SpanText(report));

@@ -37,6 +37,7 @@ ColumnValues ValuesOf(const SampleRows& rows, std::size_t column) {
     ColumnValues found;
     for (const auto& fields : rows.All()) {
         const NumberField number = ReadNumber(fields[column], rows.Decimal());
+        // Missing values interrupt neither a constant nor a counter.
         if (number.kind != NumberKind::Value && number.kind != NumberKind::Marked)
             continue;
         found.values.push_back(number.value);
@@ -98,6 +99,21 @@ std::optional<std::size_t> FirstMeasurement(const SampleRows& rows, const TableL
     return best;
 }
 
+/// The columns of the twelve months, by their names, in a table with a row for each year; empty in
+/// another table.
+std::vector<std::size_t> MonthColumns(const TableLayout& layout) {
+    const TimeLayout& time = layout.time;
+    if (time.source != TimeSource::Columns || time.columns.size() != 1 ||
+        time.columns[0].role != TimeRole::Date || time.form != DateForm::Year)
+        return {};
+    constexpr std::size_t kMonths = 12;
+    std::vector<std::size_t> months;
+    for (std::size_t i = 0; i < layout.columns.size() && months.size() < kMonths; ++i)
+        if (MonthOfName(layout.columns[i].name) == static_cast<int>(months.size()) + 1)
+            months.push_back(i);
+    return months.size() == kMonths ? months : std::vector<std::size_t>();
+}
+
 Status ChooseNamed(const ImportSettings& settings, TableLayout* layout) {
     for (const std::string& name : settings.itemColumns) {
         const std::optional<std::size_t> column = FindColumn(layout->columns, name);
@@ -120,6 +136,12 @@ Status ChooseItems(const SampleRows& rows, const ImportSettings& settings, Table
     layout->items.clear();
     if (!settings.itemColumns.empty())
         return ChooseNamed(settings, layout);
+    layout->months = MonthColumns(*layout);
+    if (!layout->months.empty()) {
+        layout->items.push_back(layout->months[0]);
+        layout->notes.emplace_back("each row holds the twelve months of a year");
+        return Status::Ok();
+    }
     const std::optional<std::size_t> column = FirstMeasurement(rows, *layout);
     if (!column)
         return Status::InputFault(
@@ -136,7 +158,9 @@ std::vector<std::size_t> OtherItems(const TableLayout& layout) {
             std::find(layout.items.begin(), layout.items.end(), i) != layout.items.end();
         const bool isOffered = column.kind == ColumnKind::Number ||
                                (column.kind == ColumnKind::Empty && !column.name.empty());
-        const bool isAside = IsTimeColumn(layout, i) || IsLabelName(column.name) ||
+        const bool isMonth =
+            std::find(layout.months.begin(), layout.months.end(), i) != layout.months.end();
+        const bool isAside = isMonth || IsTimeColumn(layout, i) || IsLabelName(column.name) ||
                              (IsTimeName(column.name) && !IsMinuteName(column.name));
         if (isOffered && !isChosen && !isAside)
             others.push_back(i);

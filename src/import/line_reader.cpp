@@ -33,6 +33,7 @@ ReadResult LineReader::Fail(std::string reason) {
 bool LineReader::Fill() {
     buffer.erase(0, begin);
     begin = 0;
+    // What was known about line ends counted from the block's old start.
     nextLf.reset();
     nextCr.reset();
     const std::size_t kept = buffer.size();
@@ -74,6 +75,8 @@ ReadResult LineReader::GiveLine(std::size_t length, std::size_t lengthWithEnd,
                                 std::string_view* line) {
     if (length > kLongestLine)
         return Fail("longer than " + std::to_string(kLongestLine) + " bytes; this is no table");
+    // A NUL means a binary file or UTF-16 without its mark; going on would give nonsense, line by
+    // line.
     *line = std::string_view(buffer).substr(begin, length);
     if (length > 0 && std::memchr(line->data(), 0, length) != nullptr)
         return Fail("holds a NUL byte; this is no text (for UTF-16 give the encoding)");

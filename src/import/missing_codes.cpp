@@ -21,6 +21,7 @@ class Extremes {
 
     void Add(float value) {
         const float outward = sign * value;
+        // Nearly every value ends here.
         if (found.size() == kKept && outward < sign * found.back().value)
             return;
         auto at = std::find_if(found.begin(), found.end(), [this, outward](const Extreme& known) {
@@ -46,6 +47,7 @@ class Extremes {
 /// Digits of a number's shortest text, without zeros at its end.
 std::string DigitsOf(float value) {
     std::string digits;
+    // Three decimals hold every code in use ("-99.99"), and cut what conversion to 32 bits adds.
     for (const char c : FixedText(static_cast<double>(std::abs(value)), 3))
         if (c >= '0' && c <= '9')
             digits += c;
@@ -69,17 +71,23 @@ bool IsIntegerLimit(float value) {
     return value == -32768.0F || value == -32767.0F || value == -2147483648.0F;
 }
 
+/// 99999999 and longer rows of nines, which a 32-bit number rounds to a power of ten.
+bool IsRoundedNines(float value) {
+    return std::abs(value) >= 1e8F && DigitsOf(value) == "1";
+}
+
 bool IsLowCode(float value) {
     if (value >= 0.0F)
         return false;
     const std::string digits = DigitsOf(value);
-    return IsHuge(value) || IsIntegerLimit(value) || value == -1.0F || value == -9.0F ||
-           (std::abs(value) >= 9.0F && IsRepeatedDigit(digits, "9", 2)) ||
+    return IsHuge(value) || IsRoundedNines(value) || IsIntegerLimit(value) || value == -1.0F ||
+           value == -9.0F || (std::abs(value) >= 9.0F && IsRepeatedDigit(digits, "9", 2)) ||
            (std::abs(value) >= 66.0F && IsRepeatedDigit(digits, "678", 3));
 }
 
 bool IsHighCode(float value) {
-    return IsHuge(value) || (value >= 9.0F && IsRepeatedDigit(DigitsOf(value), "9", 2));
+    return IsHuge(value) || IsRoundedNines(value) ||
+           (value >= 9.0F && IsRepeatedDigit(DigitsOf(value), "9", 2));
 }
 
 /// The values that are no candidates for codes.
@@ -100,9 +108,11 @@ bool IsClearLow(const Extreme& code, const Rest& rest, bool isFine) {
         return code.value != -1.0F && code.value != -9.0F;
     const bool isOnlyNegative = rest.low >= 0.0F;
     if (code.value == -1.0F || code.value == -9.0F)
+        // Whole numbers may be degrees, or the "-1" that stands for a trace of rain.
         return isOnlyNegative && isFine && code.count >= 3;
     if (isOnlyNegative)
         return code.count >= 2 || DigitsOf(code.value).size() >= 3;
+    // Levels and temperatures go below zero; a code lies further below them than they spread.
     return rest.low - code.value > rest.high - rest.low;
 }
 
@@ -112,6 +122,8 @@ bool IsClearHigh(const Extreme& code, const Rest& rest) {
     if (rest.isEmpty)
         return code.count >= 3;
     const float gap = code.value - rest.high;
+    // A flood may reach 999 once. It does not do so three times to the last digit, with nothing
+    // near it.
     return code.count >= 3 && gap > rest.high - rest.low && gap > std::abs(rest.high);
 }
 
@@ -190,10 +202,12 @@ void TakeAnnounced(const TableLayout& layout, std::vector<float>* series, Import
 }
 
 void NoteDoubtful(const Extreme& code, const std::string& column, ImportReport* report) {
-    if (code.count < 3)
+    const bool isLong = DigitsOf(code.value).size() >= 4 || IsRoundedNines(code.value);
+    if (code.count < 3 && !isLong)
         return;
-    report->notes.push_back(ShortestText(code.value) + " occurs " + std::to_string(code.count) +
-                            " times in column " + column +
+    report->notes.push_back(ShortestText(code.value) + " occurs " +
+                            (code.count == 1 ? "once" : std::to_string(code.count) + " times") +
+                            " in column " + column +
                             " and is taken as a value; if it means missing, say --missing " +
                             ShortestText(code.value));
 }

@@ -30,6 +30,8 @@ bool ReadAxis(const TsqHeader* header, Axis* axis) {
     std::string clock;
     int unit = kUnitUndefined;
     double start = 0.0;
+    // Files of other programs have a non-equidistant axis in seconds; the other types come from
+    // files of this system, which are taken as well.
     switch (tsqGetTimeAxisType(header)) {
     case kTsqEqTimeAxis:
         tsqGetEqTimeAxis(header, &unit, nullptr, &start, nullptr, &axis->count, nullptr);
@@ -56,6 +58,7 @@ bool ReadAxis(const TsqHeader* header, Axis* axis) {
         (ParseDate(date + " " + clock, DateForm::YearMonthDay, &parts) != TimeResult::Ok ||
          MomentOf(parts, {}, &axis->origin) != TimeResult::Ok))
         return false;
+    // The times of the steps count from the axis's start, which may lie behind its date.
     axis->origin += std::llround(start * axis->millisInUnit);
     return true;
 }
@@ -110,6 +113,8 @@ Status ChooseItems(const std::string& path, const ImportSettings& settings, TsqH
                    std::vector<int>* chosen, ImportReport* report) {
     if (!settings.itemColumns.empty())
         return ChooseNamed(path, settings.itemColumns, header, chosen);
+    // A file of one station often has its coordinates beside the series; what has values at many
+    // places is passed over as long as one series is left.
     for (int i = 1; i <= tsqGetNoOfItems(header); ++i) {
         if (InfoOf(header, i).size != 1)
             continue;
@@ -124,6 +129,7 @@ Status ChooseItems(const std::string& path, const ImportSettings& settings, TsqH
     return Status::Ok();
 }
 
+/// Codes that the file does not mark itself; what it marks arrives as NaN.
 void ApplyGivenCodes(const MissingRules& missing, float* value, ImportReport* report) {
     if (std::find(missing.numbers.begin(), missing.numbers.end(), *value) == missing.numbers.end())
         return;
@@ -151,6 +157,7 @@ Status ReadSteps(const std::string& path, const Axis& axis, const std::vector<in
         for (int item = 1; item <= items; ++item) {
             const auto at = std::find(chosen.begin(), chosen.end(), item);
             float value = 0.0F;
+            // Items that are not asked for are passed over without being loaded.
             if (tsqReadItemTimeStep(header, file, &time, at == chosen.end() ? nullptr : &value) !=
                 0)
                 return TakeError(path);
@@ -160,6 +167,7 @@ Status ReadSteps(const std::string& path, const Axis& axis, const std::vector<in
             samples->values[static_cast<std::size_t>(at - chosen.begin())].push_back(value);
         }
         samples->times.push_back(axis.origin + std::llround(time * axis.millisInUnit));
+        // Messages name steps where those about tables name lines.
         samples->lines.push_back(static_cast<std::uint32_t>(step + 1));
     }
     report->rowsRead = axis.count;
@@ -169,6 +177,7 @@ Status ReadSteps(const std::string& path, const Axis& axis, const std::vector<in
 } // namespace
 
 bool IsNetcdf(std::string_view start) {
+    // A table may begin with the letters CDF too; the version behind them is no character.
     constexpr std::string_view kClassic = "CDF";
     constexpr std::string_view kHdf5 = "\x89HDF\r\n\x1A\n";
     return (start.substr(0, kClassic.size()) == kClassic && start.size() > 3 && start[3] >= 1 &&
@@ -181,6 +190,8 @@ Status ReadNetcdfSeries(const std::string& path, const ImportSettings& settings,
     report->form = "netCDF file";
     TsqHeaderHandle header;
     TsqFileHandle file;
+    // In any order: sorting is the user's choice here as for tables, and the fault then names the
+    // steps.
     if (tsqFileReadUnordered(path, &header, &file) != 0)
         return TakeError(path);
     Axis axis;

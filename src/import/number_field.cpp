@@ -109,6 +109,22 @@ NumberField ReadPlain(const PlainNumber& number, std::string_view field) {
     return {NumberKind::Marked, result.value, rest};
 }
 
+/// "1,234.5", "1.234,5", "1 234", "1'234".
+bool IsGrouped(std::string_view field, char decimal) {
+    if (!field.empty() && (field[0] == '-' || field[0] == '+'))
+        field.remove_prefix(1);
+    const std::size_t first = field.find_first_not_of("0123456789");
+    if (first == 0 || first == std::string_view::npos || first > 3 || field[0] == '0' ||
+        field[first] == decimal)
+        return false;
+    const std::string_view sign = field.substr(first, field[first] == '\xC2' ? 2 : 1);
+    if (sign != "," && sign != "." && sign != " " && sign != "'" && sign != "\xC2\xA0")
+        return false;
+    const std::string_view group = field.substr(first + sign.size());
+    return group.size() >= 3 && IsDigits(group.substr(0, 3)) &&
+           (group.size() == 3 || !IsDigit(group[3]));
+}
+
 } // namespace
 
 bool IsMissingWord(std::string_view field) {
@@ -130,8 +146,12 @@ NumberField ReadNumber(std::string_view field, char decimal) {
                    : NumberField{};
     }
     const PlainNumber number(field, decimal);
-    if (!number.IsEmpty() && number.StartsAsNumber())
-        return ReadPlain(number, field);
+    if (!number.IsEmpty() && number.StartsAsNumber()) {
+        const NumberField read = ReadPlain(number, field);
+        return read.kind == NumberKind::NoNumber && IsGrouped(field, decimal)
+                   ? NumberField{NumberKind::Grouped, 0.0F, {}}
+                   : read;
+    }
     return IsInfinityWord(field) ? NumberField{NumberKind::NotFinite, 0.0F, {}} : NumberField{};
 }
 

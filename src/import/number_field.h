@@ -11,6 +11,7 @@ enum class NumberKind {
     Missing,   ///< empty, or a usual word or mark for a missing value
     Marked,    ///< a number with a quality mark behind it: "12.3 e", "31.1*"
     Censored,  ///< "<0.5", ">12": a bound, not a value
+    Grouped,   ///< with a sign between thousands: "1,234.5"
     NotFinite, ///< "inf"
     TooLarge,  ///< beyond the range of a 32-bit float
     NoNumber,

@@ -54,6 +54,7 @@ Roles RolesBorneOut(const TimeSearch& search) {
         if (at == named.end() || !HasLarger(roles, role))
             continue;
         const auto column = static_cast<std::size_t>(at - named.begin());
+        // A name alone is not enough: "Mon" may be a monitor, "sec" a second gauge.
         const std::optional<TimeRole> found = BorneOut(search, roles, column, role);
         if (found)
             roles.emplace(*found, column);

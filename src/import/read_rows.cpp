@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <optional>
 
+#include "import/bad_rows.h"
+#include "import/item_values.h"
 #include "import/number_field.h"
 #include "import/record_reader.h"
 #include "import/table_shape.h"
@@ -13,53 +15,18 @@ namespace ryn {
 
 namespace {
 
-/// The rows that cannot be read: the first one's fault in full, and the lines of the first few.
-class BadRows {
-  public:
-    void Add(long line, const std::string& fault) {
-        if (rows.count == 0)
-            first = "line " + std::to_string(line) + ": " + fault;
-        rows.Add(line);
-    }
-    bool IsEmpty() const { return rows.count == 0; }
-    Status AsFault(const std::string& source) const {
-        std::string text = source + ": " + first;
-        if (rows.count > 1)
-            text += " (" + std::to_string(rows.count) + " rows cannot be read: lines " +
-                    LineList(rows.firstLines, rows.count) + ")";
-        return Status::InputFault(text);
-    }
-
-  private:
-    std::string first;
-    DroppedRows rows;
-};
-
-void CountText(std::string_view text, std::vector<OccurredText>* texts) {
-    constexpr std::size_t kMostTexts = 20; // a hostile table may have a new one in each row
-    for (OccurredText& known : *texts) {
-        if (known.text == text || texts->size() == kMostTexts) {
-            ++known.count;
-            return;
-        }
-    }
-    texts->push_back({std::string(text), 1, {}});
-}
-
 class RowParser {
   public:
     RowParser(const TableLayout& tableLayout, const MissingRules& missingRules,
               TableSamples* tableSamples, ImportReport* importReport)
         : layout(tableLayout),
-          missing(missingRules),
           samples(tableSamples),
           report(importReport),
+          values(tableLayout, missingRules, importReport, &bad),
           time(tableLayout.time),
           row(tableLayout.items.size()) {
         samples->values.resize(layout.items.size());
         samples->isRelative = layout.time.isRelative;
-        emptyIsMissing =
-            std::find(missing.texts.begin(), missing.texts.end(), "") != missing.texts.end();
     }
 
     /// A line that is no row by its look: blank, a comment, a divider.
@@ -68,27 +35,23 @@ class RowParser {
     Status Finish(const std::string& source);
 
   private:
-    enum class ValueResult { Taken, Missing, Bad };
-
     bool HasTimeColumns() const { return layout.time.source != TimeSource::StartAndStep; }
     TimeResult ReadTime(const std::vector<std::string_view>& fields, Millis* moment);
     void TakeRowWithoutTime(const TableRecord& record, const std::vector<std::string_view>& fields);
     bool IsHeaderAgain(const std::vector<std::string_view>& fields) const;
     bool HasFields(const TableRecord& record, std::size_t count);
-    ValueResult ReadValue(long line, std::size_t item, std::string_view field);
-    ValueResult Refuse(long line, std::size_t item, std::string_view field, NumberKind kind);
-    bool IsGivenCode(std::string_view text) const;
-    ValueResult CountMissing(std::string_view text);
+    void TakeSample(long line, Millis moment, const std::vector<std::string_view>& fields,
+                    const std::vector<std::size_t>& columns);
     void CheckOffset(long line);
     void PendingAreBad();
 
     const TableLayout& layout;
-    const MissingRules& missing;
     TableSamples* samples;
     ImportReport* report;
+    BadRows bad;
+    ItemValues values;
     TimeReader time;
     std::vector<float> row;
-    bool emptyIsMissing = false;
     std::int64_t steps = 0;  // rows before this one, for an axis of start and step
     DroppedRows pendingText; // lines of text, which are a footer when no row follows
     std::string firstPendingText;
@@ -96,24 +59,25 @@ class RowParser {
     std::optional<long> firstWithOffset;
     std::optional<long> firstWithoutOffset;
     long rowsWithHour24 = 0;
-    BadRows bad;
 };
 
 bool RowParser::PassOver(const TableRecord& record) {
     if (Trimmed(record.text).empty()) {
+        // Kept until it is known whether rows follow: blank lines at the end mean nothing.
         if (!HasTimeColumns() && pendingBlank.size() < DroppedRows::kMostLines)
             pendingBlank.push_back(record.line);
-        if (!HasTimeColumns() && emptyIsMissing) {
+        if (!HasTimeColumns() && values.IsEmptyGiven()) {
             ++steps;
             ++report->rowsRead;
             pendingBlank.clear();
             report->Dropped(DropReason::MissingValue).Add(record.line);
-            (void)CountMissing("");
+            (void)values.CountMissing("");
         }
         return true;
     }
     if (CommentMarkSize(record.text, layout.commentMarks) > 0)
         return true;
+    // In a single column "---" is a missing value.
     if (layout.columns.size() > 1 && IsSeparatorLine(record.text, layout.delimiter)) {
         report->Dropped(DropReason::Divider).Add(record.line);
         return true;
@@ -150,10 +114,13 @@ void RowParser::TakeRowWithoutTime(const TableRecord& record,
         return;
     }
     const std::string text = time.TextOf(fields);
+    // Spreadsheets export the empty rows below a table.
     if (std::all_of(fields.begin(), fields.end(), IsMissingWord)) {
         report->Dropped(DropReason::EmptyRow).Add(record.line);
     } else if (IsHeaderAgain(fields)) {
         report->Dropped(DropReason::RepeatedHeader).Add(record.line);
+        // What begins like a time and is none is a fault, at the end of the table too, where the
+        // file may be cut. What begins like a word may be a footer, if no row follows.
     } else if (!text.empty() && !IsDigit(text[0]) && text[0] != '-' && text[0] != '+') {
         if (pendingText.count == 0)
             firstPendingText = record.text.substr(0, 200);
@@ -167,6 +134,8 @@ void RowParser::TakeRowWithoutTime(const TableRecord& record,
 
 void RowParser::PendingAreBad() {
     if (pendingText.count > 0) {
+        // A table goes on behind a text: another gauge, a change of datum. Nobody but the user can
+        // tell.
         for (const long line : pendingText.firstLines)
             bad.Add(line, Quoted(firstPendingText) + " stands between rows and is none");
         pendingText = {};
@@ -178,7 +147,8 @@ void RowParser::PendingAreBad() {
 }
 
 bool RowParser::HasFields(const TableRecord& record, std::size_t count) {
-    const std::size_t last = *std::max_element(layout.items.begin(), layout.items.end());
+    const std::vector<std::size_t>& columns = layout.months.empty() ? layout.items : layout.months;
+    const std::size_t last = *std::max_element(columns.begin(), columns.end());
     const bool isShifted = layout.delimiter == kBlanks && count < layout.columns.size();
     if (isShifted) {
         // Between blanks a missing field leaves no trace, and those behind it move up.
@@ -186,68 +156,13 @@ bool RowParser::HasFields(const TableRecord& record, std::size_t count) {
                                  std::to_string(layout.columns.size()));
         return false;
     }
-    if (count <= last && !emptyIsMissing) {
+    // Cut lines and rows of another table end too early as well.
+    if (count <= last && !values.IsEmptyGiven()) {
         bad.Add(record.line, "ends before column " + ColumnTitle(layout, last) +
                                  "; if the value is missing there say --missing \"\"");
         return false;
     }
     return true;
-}
-
-bool RowParser::IsGivenCode(std::string_view text) const {
-    return std::any_of(missing.texts.begin(), missing.texts.end(), [text](const std::string& code) {
-        return Lowercase(code) == Lowercase(text);
-    });
-}
-
-RowParser::ValueResult RowParser::CountMissing(std::string_view text) {
-    CountText(text, &report->missing);
-    return ValueResult::Missing;
-}
-
-RowParser::ValueResult RowParser::Refuse(long line, std::size_t item, std::string_view field,
-                                         NumberKind kind) {
-    const std::string place =
-        Quoted(field) + " in column " + ColumnTitle(layout, layout.items[item]);
-    switch (kind) {
-    case NumberKind::NotFinite:
-        bad.Add(line, place + " is not finite");
-        break;
-    case NumberKind::TooLarge:
-        bad.Add(line, place + " is too large for a 32-bit number");
-        break;
-    case NumberKind::Censored:
-        bad.Add(line, place + " is a bound and not a value; leave such rows out with --missing \"" +
-                          std::string(field.substr(0, 1)) + "\", or edit them");
-        break;
-    default:
-        bad.Add(line, place + " is no number" +
-                          (field.find_first_of("0123456789") == std::string_view::npos
-                               ? "; if it marks a missing value say so with --missing"
-                               : std::string()));
-    }
-    return ValueResult::Bad;
-}
-
-RowParser::ValueResult RowParser::ReadValue(long line, std::size_t item, std::string_view field) {
-    const NumberField number = ReadNumber(field, layout.decimal);
-    if (number.kind == NumberKind::Missing)
-        return CountMissing(field);
-    if (!missing.texts.empty()) {
-        const bool isNumber = number.kind == NumberKind::Value || number.kind == NumberKind::Marked;
-        const bool isCode = isNumber && std::find(missing.numbers.begin(), missing.numbers.end(),
-                                                  number.value) != missing.numbers.end();
-        if (isCode || IsGivenCode(field))
-            return CountMissing(field);
-        if (!number.mark.empty() && IsGivenCode(number.mark))
-            return CountMissing(number.mark);
-    }
-    if (number.kind == NumberKind::Marked)
-        CountText(number.mark, &report->marks);
-    else if (number.kind != NumberKind::Value)
-        return Refuse(line, item, field, number.kind);
-    row[item] = number.value;
-    return ValueResult::Taken;
 }
 
 void RowParser::CheckOffset(long line) {
@@ -273,18 +188,28 @@ void RowParser::TakeRow(const TableRecord& record, const std::vector<std::string
     CheckOffset(record.line);
     if (!HasFields(record, fields.size()))
         return;
+    if (layout.months.empty())
+        TakeSample(record.line, moment, fields, layout.items);
+    for (std::size_t month = 0; month < layout.months.size(); ++month)
+        TakeSample(record.line, *Advance(moment, {static_cast<int>(month), 0}, month > 0 ? 1 : 0),
+                   fields, {layout.months[month]});
+}
+
+void RowParser::TakeSample(long line, Millis moment, const std::vector<std::string_view>& fields,
+                           const std::vector<std::size_t>& columns) {
     ValueResult result = ValueResult::Taken;
-    for (std::size_t i = 0; i < layout.items.size(); ++i) {
-        const std::size_t column = layout.items[i];
+    for (std::size_t i = 0; i < columns.size(); ++i) {
+        const std::size_t column = columns[i];
+        // A row that ends early has nothing there, as the user has said.
         const std::string_view field = column < fields.size() ? fields[column] : std::string_view();
-        result = std::max(result, ReadValue(record.line, i, field));
+        result = std::max(result, values.Read(line, column, field, &row[i]));
     }
     if (result == ValueResult::Missing)
-        report->Dropped(DropReason::MissingValue).Add(record.line);
+        report->Dropped(DropReason::MissingValue).Add(line);
     if (result != ValueResult::Taken)
         return;
     samples->times.push_back(moment);
-    samples->lines.push_back(static_cast<std::uint32_t>(record.line));
+    samples->lines.push_back(static_cast<std::uint32_t>(line));
     for (std::size_t i = 0; i < row.size(); ++i)
         samples->values[i].push_back(row[i]);
 }
@@ -297,6 +222,7 @@ Status RowParser::Finish(const std::string& source) {
             report->Dropped(DropReason::Footer).Add(line);
     if (pendingText.count > 0)
         report->Dropped(DropReason::Footer).count = pendingText.count;
+    // Rows in UTC and rows in an unknown local time do not make one series.
     if (firstWithOffset && firstWithoutOffset)
         return Status::InputFault(source + ": line " + std::to_string(*firstWithoutOffset) +
                                   ": the time has no offset from UTC, and the one in line " +

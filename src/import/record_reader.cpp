@@ -17,6 +17,7 @@ ReadResult RecordReader::ReadLine(TableRecord* record) {
 }
 
 ReadResult RecordReader::Split(TableRecord* record, FieldList* fields) {
+    // The usual case: the row is one line.
     if (fields->Split(record->text, delimiter))
         return ReadResult::Found;
     // Each line with a quote is a new look at the whole, so that their number is the factor by

@@ -8,10 +8,12 @@ namespace ryn {
 namespace {
 
 void SortByTime(TableSamples* samples) {
+    // Most tables are sorted, and need no copy.
     if (std::is_sorted(samples->times.begin(), samples->times.end()))
         return;
     std::vector<std::size_t> order(samples->Count());
     std::iota(order.begin(), order.end(), std::size_t{0});
+    // Stable, so that "first" and "last" of equal times mean the order in the table.
     std::stable_sort(order.begin(), order.end(), [samples](std::size_t a, std::size_t b) {
         return samples->times[a] < samples->times[b];
     });
@@ -37,6 +39,8 @@ void Merge(std::size_t from, std::size_t to, DuplicateRule rule, TableSamples* s
 void MergeDuplicates(DuplicateRule rule, TableSamples* samples, ImportReport* report) {
     std::size_t kept = 0;
     for (std::size_t i = 1; i < samples->Count(); ++i) {
+        // Neighbours only: without --sort equal times further apart are backward steps, and stay a
+        // fault.
         if (samples->times[i] == samples->times[kept]) {
             report->Dropped(DropReason::Duplicate).Add(samples->lines[i]);
             Merge(i, kept, rule, samples);
@@ -74,6 +78,7 @@ Status OrderSamples(const std::string& source, RowOrder order, DuplicateRule rul
     }
     if (first.empty())
         return Status::Ok();
+    // Lines and remedy in one message: the user decides with the table at hand.
     std::string text = source + ":";
     if (backward.count > 0)
         text += " time runs backwards in line " + LineList(backward.firstLines, backward.count) +

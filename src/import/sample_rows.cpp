@@ -14,6 +14,7 @@ SampleRows::SampleRows(const TableShape& shape, const RowRun& run,
       decimal(shape.decimal) {
     for (std::size_t i = run.first; i <= run.last && i < shape.rows.size(); ++i) {
         const HeadRow& row = shape.rows[i];
+        // Rows of another size, empty ones and headers within say nothing about single columns.
         if (row.hasData && row.fields.size() == shape.fieldCount)
             rows.push_back(row.Views());
     }
@@ -30,6 +31,7 @@ std::optional<std::size_t> FindColumn(const std::vector<ColumnLayout>& columns,
                                       const std::string& nameOrNumber) {
     const std::string wanted(Trimmed(nameOrNumber));
     const std::optional<int> number = IsDigits(wanted) ? ParseInt(wanted) : std::nullopt;
+    // A number goes before a name: a column named "2" is rare, and its number names it as well.
     if (number && *number >= 1 && static_cast<std::size_t>(*number) <= columns.size())
         return static_cast<std::size_t>(*number) - 1;
     std::string withoutUnit;
@@ -48,6 +50,7 @@ std::optional<std::size_t> FindColumn(const std::vector<ColumnLayout>& columns,
 }
 
 Status NoSuchColumn(const std::string& option, const std::string& name, const TableLayout& layout) {
+    // One readable line, whatever the table.
     constexpr std::size_t kMostListed = 30;
     std::string list;
     for (std::size_t i = 0; i < layout.columns.size() && i < kMostListed; ++i)
@@ -56,7 +59,7 @@ Status NoSuchColumn(const std::string& option, const std::string& name, const Ta
 }
 
 std::string ColumnTitle(const TableLayout& layout, std::size_t column) {
-    const std::string number = std::to_string(column + 1);
+    std::string number = std::to_string(column + 1);
     if (column >= layout.columns.size() || layout.columns[column].name.empty())
         return number;
     return number + " " + Quoted(layout.columns[column].name);

@@ -11,7 +11,7 @@ Status FindEncoding(TextSource& source, TextEncoding* encoding) {
     std::string start(kLooked, '\0');
     std::size_t size = 0;
     for (std::size_t got = 1; got > 0 && size < kLooked; size += got) {
-        const Status status = source.Read(start.data() + size, kLooked - size, &got);
+        Status status = source.Read(start.data() + size, kLooked - size, &got);
         if (!status)
             return status;
     }
@@ -33,8 +33,10 @@ Status ReadHead(TextSource& source, TextEncoding encoding, long skipLines, HeadL
         result = reader.Read(&line);
         if (result != ReadResult::Found)
             break;
+        // Lines keep the numbers that an editor shows.
         if (reader.LineNumber() <= skipLines || Trimmed(line).empty())
             continue;
+        // A long licence in comments must not use up the look at the rows.
         counted += line[0] == '#' ? 0 : 1;
         read.lines.push_back({reader.LineNumber(), ToUtf8(line, encoding)});
     }

@@ -85,7 +85,8 @@ struct TableLayout {
     long dataLine = 1; ///< the first row
     std::vector<ColumnLayout> columns;
     TimeLayout time;
-    std::vector<std::size_t> items; ///< columns, from 0
+    std::vector<std::size_t> items;  ///< columns, from 0
+    std::vector<std::size_t> months; ///< twelve columns of one item, a year's months on each row
     std::vector<AnnouncedCode> announced;
     std::vector<std::vector<std::string>> preview; ///< the first rows as fields
     std::vector<std::string> notes;                ///< what a user should know about the guesses

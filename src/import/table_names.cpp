@@ -135,32 +135,12 @@ void SetColumn(const std::string& title, ColumnLayout* column) {
 
 /// Where a line speaks of missing values; npos when it does not.
 std::size_t MentionOfMissing(const std::string& line) {
-    const std::string lower = Lowercase(line);
-    std::size_t first = std::string::npos;
-    for (const std::string_view word : {"missing",
-                                        "no data",
-                                        "nodata",
-                                        "no_data",
-                                        "no-data",
-                                        "inval",
-                                        "not available",
-                                        "fillvalue",
-                                        "fill value",
-                                        "fill_value",
-                                        "undefined",
-                                        "fehlwert",
-                                        "l\xC3\xBC"
-                                        "cke",
-                                        "luecke",
-                                        "ontbrek",
-                                        "manquant",
-                                        "lacune",
-                                        "mancant",
-                                        "faltant",
-                                        "mangler",
-                                        "saknas"})
-        first = std::min(first, lower.find(word));
-    return first;
+    // In the languages of the headers seen; stems, since they are inflected.
+    return FindOneOf(
+        Lowercase(line),
+        "missing|no data|nodata|no_data|no-data|inval|not available|fillvalue|"
+        "fill value|fill_value|undefined|fehlwert|lücke|luecke|ontbrek|manquant|lacune|"
+        "mancant|faltant|mangler|saknas");
 }
 
 /// Numbers that no gauge measures: negative, or made of nines, or huge.

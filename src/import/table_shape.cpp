@@ -90,14 +90,28 @@ class HeadSplitter {
     std::size_t looked = 0; ///< characters of joined lines
 };
 
+/// How much a field of a kind speaks for a delimiter: numbers that are not quite ones less.
+double Weight(FieldKind kind) {
+    switch (kind) {
+    case FieldKind::Text:
+        return 0.0;
+    case FieldKind::Marked:
+    case FieldKind::Grouped:
+        return 0.5;
+    default:
+        return 1.0;
+    }
+}
+
 /// Share of a row's fields that are understood; 0 for a row without any number or time.
 double Explained(const HeadRow& row, char decimal) {
     double understood = 0.0;
     bool hasData = false;
     for (const std::string& field : row.fields) {
         const FieldKind kind = KindOfField(field, decimal);
-        hasData = hasData || kind == FieldKind::Number || kind == FieldKind::Time;
-        understood += kind == FieldKind::Text ? 0.0 : (kind == FieldKind::Marked ? 0.5 : 1.0);
+        hasData = hasData || kind == FieldKind::Number || kind == FieldKind::Grouped ||
+                  kind == FieldKind::Time;
+        understood += Weight(kind);
     }
     return hasData ? understood / static_cast<double>(row.fields.size()) : 0.0;
 }
@@ -161,8 +175,8 @@ ColumnKind KindOfColumn(const std::vector<const HeadRow*>& rows, std::size_t col
     const double present = static_cast<double>(rows.size()) - counts[FieldKind::Missing];
     if (present == 0.0)
         return ColumnKind::Empty;
-    if (counts[FieldKind::Number] + counts[FieldKind::Marked] >= kMost * present &&
-        counts[FieldKind::Number] > 0.0)
+    const double plain = counts[FieldKind::Number] + counts[FieldKind::Grouped];
+    if (plain > 0.0 && plain + counts[FieldKind::Marked] >= kMost * present)
         return ColumnKind::Number;
     return counts[FieldKind::Time] >= kMost * present ? ColumnKind::Time : ColumnKind::Text;
 }
@@ -175,6 +189,7 @@ std::vector<ColumnKind> KindsOfColumns(const TableShape& shape) {
         if (row.hasData && row.fields.size() == shape.fieldCount)
             rows.push_back(&row);
     std::reverse(rows.begin(), rows.end());
+    // Fewer rows than this say too little about a column.
     constexpr std::size_t kEnough = 5;
     std::vector<ColumnKind> kinds(shape.fieldCount, ColumnKind::Empty);
     for (const unsigned part : {4U, 2U, 1U}) {
@@ -207,7 +222,8 @@ FieldMatch MatchField(ColumnKind kind, std::string_view field, char decimal) {
         return FieldMatch::Free;
     const bool fits = kind == ColumnKind::Time
                           ? found == FieldKind::Time
-                          : found == FieldKind::Number || found == FieldKind::Marked;
+                          : found == FieldKind::Number || found == FieldKind::Marked ||
+                                found == FieldKind::Grouped;
     return fits ? FieldMatch::Yes : FieldMatch::No;
 }
 
@@ -246,6 +262,8 @@ FieldKind KindOfField(std::string_view field, char decimal) {
         return FieldKind::Missing;
     case NumberKind::Marked:
         return FieldKind::Marked;
+    case NumberKind::Grouped:
+        return FieldKind::Grouped;
     case NumberKind::NoNumber:
         return LooksLikeTime(field) ? FieldKind::Time : FieldKind::Text;
     default:

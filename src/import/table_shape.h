@@ -42,7 +42,7 @@ struct RowRun {
 };
 
 /// What a single field is. Numbers with a mark behind are Number where `marks` counts them so.
-enum class FieldKind { Missing, Number, Marked, Time, Text };
+enum class FieldKind { Missing, Number, Marked, Grouped, Time, Text };
 FieldKind KindOfField(std::string_view field, char decimal);
 
 /// Splits the head under each delimiter and decimal sign that the settings leave open and takes the

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "import/text_encoding.h"
+
 namespace ryn {
 
 namespace {
@@ -71,6 +73,7 @@ bool IsDigits(std::string_view text) {
 std::vector<std::string> Words(std::string_view text) {
     std::vector<std::string> words;
     std::string word;
+    // The blank at the end closes the last word.
     for (const char c : Lowercase(text) + " ") {
         if (IsLetter(c) || static_cast<unsigned char>(c) >= 0x80) {
             word += c;
@@ -92,7 +95,17 @@ bool StartsWithOneOf(std::string_view lower, std::string_view list) {
                    [lower](std::string_view word) { return lower.substr(0, word.size()) == word; });
 }
 
+std::size_t FindOneOf(std::string_view lower, std::string_view list) {
+    std::size_t first = std::string_view::npos;
+    AnyWord(list, [lower, &first](std::string_view word) {
+        first = std::min(first, lower.find(word));
+        return false; // all of them
+    });
+    return first;
+}
+
 bool IsSeparatorLine(std::string_view line, char delimiter) {
+    // An unresolved merge leaves its marks as lines of their own.
     line = Trimmed(line);
     for (const char mark : {'<', '=', '>', '|'})
         if (StartsWithRepeated(line, mark))
@@ -101,15 +114,26 @@ bool IsSeparatorLine(std::string_view line, char delimiter) {
         return IsDigit(c) || IsLetter(c) || static_cast<unsigned char>(c) >= 0x80 || c == '"';
     });
     const bool divided = delimiter != ' ' && line.find(delimiter) != std::string_view::npos;
+    // Stars and fields between delimiters may be missing values, and two dashes too.
     return line.size() >= 3 && onlyMarks && !divided && line.find('*') == std::string_view::npos;
 }
 
-std::string Quoted(std::string_view text) {
+std::string ShownText(std::string_view text) {
     constexpr std::size_t kShown = 60;
-    std::string shown(text.substr(0, kShown));
+    // Texts of the table come in its own encoding; messages are UTF-8.
+    std::string shown = ToUtf8(text.substr(0, 4 * kShown), TextEncoding::Utf8);
     for (char& c : shown)
         c = static_cast<unsigned char>(c) < 0x20 ? ' ' : c;
-    return "\"" + shown + (text.size() > kShown ? "...\"" : "\"");
+    if (shown.size() <= kShown)
+        return shown;
+    std::size_t end = kShown;
+    while ((static_cast<unsigned char>(shown[end]) & 0xC0U) == 0x80U) // not within a character
+        --end;
+    return shown.substr(0, end) + "...";
+}
+
+std::string Quoted(std::string_view text) {
+    return "\"" + ShownText(text) + "\"";
 }
 
 } // namespace ryn

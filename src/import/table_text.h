@@ -23,10 +23,14 @@ std::vector<std::string> Words(std::string_view text);
 bool IsOneOf(std::string_view text, std::string_view list);
 /// True where a text in lower case begins with one of the words of such a list.
 bool StartsWithOneOf(std::string_view lower, std::string_view list);
+/// Where the first of the words of such a list stands in a text in lower case; npos for none.
+std::size_t FindOneOf(std::string_view lower, std::string_view list);
 /// A line that only divides: no letter and no digit ("=======", "-----"), or a merge tool's mark.
 /// Decimal points, quotes and missing marks in fields do not make one: a delimiter does not occur.
 bool IsSeparatorLine(std::string_view line, char delimiter);
-/// The text in double quotes with line breaks shown as blanks, cut when it is long.
+/// A text for messages: in UTF-8, control characters as blanks, cut when it is long.
+std::string ShownText(std::string_view text);
+/// The same in double quotes.
 std::string Quoted(std::string_view text);
 
 } // namespace ryn

@@ -40,6 +40,7 @@ void AppendUtf8(unsigned code, std::string* text) {
 std::size_t SequenceLength(unsigned lead) {
     if (lead < 0x80)
         return 1;
+    // 0xC0 and 0xC1 begin only overlong forms, which are no UTF-8.
     if (lead >= 0xC2 && lead < 0xE0)
         return 2;
     if (lead >= 0xE0 && lead < 0xF0)
@@ -103,6 +104,7 @@ std::string EncodingName(TextEncoding encoding) {
 
 std::optional<TextEncoding> EncodingOfName(std::string_view name) {
     std::string key = Lowercase(name);
+    // People write utf8, UTF-8, utf_8; "Latin 1" and "latin-1".
     key.erase(std::remove_if(key.begin(), key.end(),
                              [](char c) { return c == '-' || c == '_' || c == ' '; }),
               key.end());
@@ -123,10 +125,12 @@ TextEncoding GuessEncoding(std::string_view start) {
         return TextEncoding::Utf16LittleEndian;
     if (start.substr(0, 2) == "\xFE\xFF")
         return TextEncoding::Utf16BigEndian;
+    // Spreadsheets and loggers forget the mark at times.
     if (ZerosAtEveryOther(start, 1))
         return TextEncoding::Utf16LittleEndian;
     if (ZerosAtEveryOther(start, 0))
         return TextEncoding::Utf16BigEndian;
+    // Text in a single-byte encoding with an accent in it is hardly ever valid UTF-8 by chance.
     return IsUtf8(start, Tail::MayBeCut) ? TextEncoding::Utf8 : TextEncoding::Windows1252;
 }
 
@@ -147,6 +151,7 @@ std::string ToUtf8(std::string_view text, TextEncoding encoding) {
     std::string result;
     for (const char c : text) {
         const unsigned byte = Byte(c);
+        // Above 0x9F the encoding is Latin-1, whose bytes are Unicode's first characters.
         AppendUtf8(byte >= 0x80 && byte < 0xA0 ? kWindows1252[byte - 0x80] : byte, &result);
     }
     return result;

@@ -16,6 +16,7 @@ Status FileSource::Open(const std::string& path, std::unique_ptr<TextSource>* so
         return Status::FromErrno(path, error.value());
     if (std::filesystem::is_directory(status))
         return Status::InputFault(path + ": is a directory, not a table");
+    // A pipe cannot be read again for its rows once its head has been looked at.
     if (!std::filesystem::is_regular_file(status))
         return Status::InputFault(path + ": is no regular file; a table is read twice");
     auto opened = std::make_unique<FileSource>();

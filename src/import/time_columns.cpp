@@ -24,6 +24,7 @@ void UseStart(const ImportSettings& settings, TableLayout* layout) {
     TimeParts parts;
     (void)ParseDate(DateText(*settings.start), DateForm::YearMonthDay, &parts);
     time.defaults = {parts.year, parts.month, parts.day};
+    // A date for the origin turns lengths of time into moments.
     if (time.isRelative) {
         time.origin = *settings.start;
         time.isRelative = false;
@@ -47,7 +48,7 @@ std::size_t BlankCount(const std::string& text) {
 
 Status FindPattern(const SampleRows& rows, const ImportSettings& settings,
                    const std::vector<std::size_t>& given, TableLayout* layout) {
-    if (const Status status = CheckPattern(settings); !status)
+    if (Status status = CheckPattern(settings); !status)
         return status;
     TimeLayout& time = layout->time;
     time = {};
@@ -58,6 +59,7 @@ Status FindPattern(const SampleRows& rows, const ImportSettings& settings,
         time.columns.push_back({column, TimeRole::Date});
     if (!given.empty())
         return Status::Ok();
+    // Where blanks part the columns, a pattern with a blank in it spans two of them.
     const std::size_t most = BlankCount(settings.pattern->Text()) + 1;
     for (std::size_t width = 1; width <= most; ++width) {
         for (std::size_t first = 0; first + width <= rows.ColumnCount(); ++first) {
@@ -91,8 +93,9 @@ Status NoTime(PartsResult parts, const ImportSettings& settings, const TableLayo
                                   "--start YYYY-MM-DD (the date of the first row)");
     if (settings.timeColumns.empty())
         return Status::InputFault(
-            "no column holds dates or times; name one with --time, or give the time of the first "
-            "row and the step with --start DATE --step S");
+            "no column holds dates or times; name one with --time (and --time-format, such as "
+            "excel "
+            "or unix), or give the time of the first row and the step with --start DATE --step S");
     std::string titles;
     for (const std::string& name : settings.timeColumns)
         titles +=
@@ -135,6 +138,8 @@ bool LacksMonth(const TimeLayout& time) {
 
 Status Search(const SampleRows& rows, const ImportSettings& settings,
               const std::vector<std::size_t>& given, TableLayout* layout) {
+    // The user's columns alone, when given: what they do not hold is a fault, not a reason to look
+    // elsewhere.
     const TimeSearch search{rows, given.empty() ? AllColumns(rows) : given,
                             settings.start.has_value()};
     PartsResult parts = PartsResult::None;
@@ -146,6 +151,7 @@ Status Search(const SampleRows& rows, const ImportSettings& settings,
     }
     if (!isFound)
         layout->time = {};
+    // The user's own axis goes before the table's times; these are still known not to be items.
     if (settings.step) {
         UseStep(settings, layout);
         return Status::Ok();

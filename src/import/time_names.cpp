@@ -75,9 +75,12 @@ bool IsMinuteName(const std::string& name) {
 }
 
 bool IsTimeName(const std::string& name) {
-    if (RoleOfName(name))
+    // "H" is more often a water level than an hour.
+    if (name.size() > 1 && RoleOfName(name))
         return true;
     const std::vector<std::string> words = Words(name);
+    if (words.size() > 1 && std::all_of(words.begin(), words.end(), RoleOfWord)) // "hh:mm"
+        return true;
     return std::any_of(words.begin(), words.end(), [](const std::string& word) {
         return IsOneOf(word,
                        "date|time|datetime|timestamp|datum|zeit|zeitpunkt|uhrzeit|tijd|fecha|data|"

@@ -12,6 +12,7 @@ constexpr std::string_view kFieldLetters = "YymdejHIMSfpbBhz";
 
 std::string_view ShortForm(char letter) {
     switch (letter) {
+    // Written out when the format is compiled, so that parsing knows single fields only.
     case 'F':
         return "%Y-%m-%d";
     case 'T':
@@ -41,6 +42,7 @@ bool TakeFraction(TextCursor* cursor, TimeParts* parts) {
     parts->millisecond = cursor->TakeNumber(3, &count);
     for (int missing = count; missing < 3; ++missing)
         parts->millisecond *= 10;
+    // Finer digits than the system keeps are cut off, not refused.
     while (IsDigit(cursor->Peek()))
         cursor->Skip();
     return count > 0;
@@ -150,6 +152,7 @@ TimeResult TimePattern::Parse(std::string_view text, TimeParts* parts) const {
                 return TimeResult::Bad;
         }
     }
+    // All of the text has to be understood: what is left over could be the part that matters.
     cursor.SkipBlanks();
     if (!cursor.IsAtEnd())
         return TimeResult::Bad;
@@ -158,6 +161,7 @@ TimeResult TimePattern::Parse(std::string_view text, TimeParts* parts) const {
 
 bool TimePattern::Has(std::string_view letters) const {
     for (std::size_t i = 0; i + 1 < expanded.size(); ++i) {
+        // A doubled percent sign is a plain character.
         if (expanded[i] != '%')
             continue;
         if (letters.find(expanded[i + 1]) != std::string_view::npos)

@@ -17,6 +17,7 @@ bool ReadWhole(std::string_view field, int most, int* value) {
             return false;
         field = field.substr(0, point);
     }
+    // More digits are no part of a date, and could overflow.
     constexpr std::size_t kMostDigits = 6;
     if (!IsDigits(field) || field.size() > kMostDigits)
         return false;
@@ -51,6 +52,8 @@ bool ReadZone(std::string_view field, TimeParts* parts) {
 
 bool ReadElapsed(std::string_view field, Millis unit, TimeParts* parts) {
     std::string plain(field.substr(0, 40));
+    // The form is decided before the decimal sign of the values matters; a number of days has no
+    // thousands.
     for (char& c : plain)
         c = c == ',' ? '.' : c;
     const std::optional<double> number = ParseDouble(plain);
@@ -112,6 +115,7 @@ TimeResult TimeReader::Read(std::span<const std::string_view> fields, Millis* mo
             break;
         if (column.column >= fields.size())
             return TimeResult::Bad;
+        // One bad part spoils the row; a missing day does so only if no other part is bad.
         const TimeResult one = ReadColumn(column, fields[column.column]);
         if (one == TimeResult::Bad)
             return one;
@@ -131,6 +135,7 @@ std::string TimeReader::TextOf(std::span<const std::string_view> fields) const {
     for (const TimeColumn& column : layout.columns) {
         if (column.column >= fields.size())
             break;
+        // Blanks between, as a pattern over several columns is written.
         if (!text.empty())
             text += ' ';
         text += fields[column.column];

@@ -15,6 +15,7 @@ namespace {
 bool FindMonths(const TimeSearch& search, TimeLayout* time) {
     for (const std::size_t column : search.columns) {
         const bool isNumber = search.rows.Column(column).kind == ColumnKind::Number;
+        // Discharges of six digits exist; months that rise from row to row do not come by chance.
         if (isNumber && !search.rows.HasDigitsOnly(column, 6))
             continue;
         *time = DateLayout(column, isNumber ? DateForm::CompactYearMonth : DateForm::YearMonth);
@@ -41,6 +42,8 @@ bool FindYears(const TimeSearch& search, TimeLayout* time) {
         *time = DateLayout(column, DateForm::Year);
         const TimeFit fit = FitTime(search.rows, *time);
         const std::string& name = search.rows.Column(column).name;
+        // A column of years may repeat them (several events a year): the name is enough, and
+        // repeated times are then told.
         if (RoleOfName(name) == TimeRole::Year && fit.IsGood())
             return true;
         if (column == 0 && search.rows.ColumnCount() > 1 && name.empty() &&
@@ -148,6 +151,7 @@ bool TimeSearch::IsUsable(std::size_t column, TimeRole role) const {
 }
 
 bool FindOtherTime(const TimeSearch& search, TimeLayout* time) {
+    // From the most telling text to the least.
     return FindMonths(search, time) || FindLengths(search, time) ||
            FindUnnamedParts(search, time) || FindYears(search, time) ||
            FindDecimalYears(search, time) || FindElapsed(search, time);

@@ -42,6 +42,7 @@ bool LooksLikeUnit(std::string_view text) {
     text = Trimmed(text);
     if (text.empty() || text.size() > kLongestUnit)
         return false;
+    // Signs alone, which the words below do not cover.
     if (text == "%" || text == "\xC2\xB0")
         return true;
     const std::string plain = WithoutUnitSigns(text);
@@ -61,6 +62,7 @@ void SplitNameAndUnit(std::string_view title, std::string* name, std::string* un
     if (cut == std::string_view::npos) {
         cut = OpeningBracket(title, '(', ')');
         if (cut != std::string_view::npos &&
+            // Square brackets always hold a unit; round ones hold all sorts of remarks.
             !LooksLikeUnit(title.substr(cut + 1, title.size() - cut - 2)))
             cut = std::string_view::npos;
     }
@@ -81,6 +83,7 @@ std::string PlainUnit(std::string_view text) {
         std::string_view name;
         std::string_view unit;
     };
+    // The unit library reads "cms" as centimetre-seconds or not at all, and "kn" as kilonewton.
     constexpr Alias kAliases[] = {{"cfs", "ft3/s"},
                                   {"cusec", "ft3/s"},
                                   {"cusecs", "ft3/s"},

@@ -14,6 +14,8 @@ constexpr int kApplicationVersion = 100;
 constexpr int kStatisticsKind = 1;
 constexpr int kAxisIndex = 2;
 
+// An equidistant axis needs no times in the file, and tells the reader that nothing is missing.
+// Both kinds read back the same moments.
 std::optional<Millis> EqualStep(const std::vector<Millis>& times) {
     if (times.size() < 2)
         return std::nullopt;
@@ -44,6 +46,7 @@ int SetAxis(const TableSamples& samples, std::optional<Millis> step, TsqHeader* 
         return tsqSetEqTimeAxis(header, kUnitSecond, Seconds(samples.times[0]), Seconds(*step),
                                 kAxisIndex);
     }
+    // The axis's date and time have whole seconds; the rest goes into its start, or into the times.
     *origin = WholeSecond(samples.times[0]);
     const std::string date = DateText(*origin);
     const std::string clock = ClockText(*origin);
@@ -57,6 +60,7 @@ int DescribeItems(TsqHeader* header, ImportReport* report) {
     int result = 0;
     for (std::size_t i = 0; i < report->items.size() && result == 0; ++i) {
         ImportedItem& item = report->items[i];
+        // A unit that the library does not know keeps its text.
         const int unit = UnitOfText(PlainUnit(item.unit));
         const int type = ItemTypeOfUnit(unit);
         item.itemType = ItemTypeText(type);
@@ -71,6 +75,7 @@ int DescribeItems(TsqHeader* header, ImportReport* report) {
 int WriteSteps(const TableSamples& samples, Millis origin, TsqHeader* header, TsqFile* file) {
     int result = 0;
     for (std::size_t i = 0; i < samples.Count() && result == 0; ++i) {
+        // From integers of milliseconds: a sum of steps would drift.
         const double time = Seconds(samples.times[i] - origin);
         for (const std::vector<float>& item : samples.values)
             result = result == 0 ? tsqWriteItemTimeStep(header, file, time, &item[i]) : result;
@@ -104,6 +109,8 @@ Status WriteSeries(const std::string& path, const std::string& title, const Tabl
         result = tsqFileCreate(path, header.get(), &file);
     if (result == 0)
         result = WriteSteps(samples, origin, header.get(), file.get());
+    // Only a file that was written whole is closed, which gives it its name; otherwise it vanishes
+    // with its handle.
     if (result == 0)
         result = tsqFileClose(header.get(), &file);
     if (result != 0)

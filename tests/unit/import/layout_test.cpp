@@ -180,6 +180,19 @@ TEST(TableLayout, JoinsDatesAndTimesThatStandInSeveralColumns) {
          "Year,Month,Rain\n2001,1,5\n2001,2,6\n",
          "2001-01-01 5; 2001-02-01 6",
          {"months alone"}},
+        {"a row for each year with its months",
+         "Year Jan Feb Mar Apr May Jun Jul Aug Sep Oct Nov Dec\n"
+         "1999 1 2 3 4 5 6 7 8 9 10 11 12.5\n2000 1 2 -99.9 4 5 6 7 8 9 10 11 -99.9\n",
+         "1999-01-01 1; 1999-02-01 2; 1999-03-01 3; 1999-04-01 4; 1999-05-01 5; 1999-06-01 6; "
+         "1999-07-01 7; 1999-08-01 8; 1999-09-01 9; 1999-10-01 10; 1999-11-01 11; "
+         "1999-12-01 12.5; 2000-01-01 1; 2000-02-01 2; 2000-04-01 4; 2000-05-01 5; 2000-06-01 6; "
+         "2000-07-01 7; 2000-08-01 8; 2000-09-01 9; 2000-10-01 10; 2000-11-01 11",
+         {"each row holds the twelve months of a year", "item: \"table\" from column 2 \"Jan\" to",
+          "missing: \"-99.9\", 2 times"}},
+        {"a water level named H is no hour",
+         "Datum;H\n2001-01-01;12\n2001-01-02;7\n2001-01-03;20\n",
+         "2001-01-01 12; 2001-01-02 7; 2001-01-03 20",
+         {"item: \"H\""}},
         {"parts without names",
          "2001 1 30 1.5\n2001 1 31 2.5\n2001 2 1 2\n",
          "2001-01-30 1.5; 2001-01-31 2.5; 2001-02-01 2",

@@ -113,6 +113,14 @@ TEST(MissingValue, IsANumberOnlyWhereThatIsUnmistakable) {
          "10 999 12 11",
          "rows read: 4"},
         {"fill values of netCDF", {"1", "9.96921e36", "2", "1e20"}, "1 2", "\"1e+20\", once"},
+        {"nines that a 32-bit number rounds",
+         {"1", "999999999", "2", "999999999", "999999999"},
+         "1 2",
+         "\"1e+09\", 3 times"},
+        {"long nines that occur once are told",
+         {"10", "9999", "12", "11"},
+         "10 9999 12 11",
+         "note: 9999 occurs once in column 2"},
         {"limits of integers", {"1", "-32768", "2"}, "1 2", "\"-32768\", once"},
     };
     for (const Case& one : cases) {

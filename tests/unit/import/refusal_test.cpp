@@ -44,8 +44,12 @@ TEST(TableRefusal, NamesTheLineOfAValueThatIsNone) {
          "line 4: \"1e999\" in column 2 \"q\" is too large for a 32-bit number"},
         {WithRow("2001-01-03,-3.5e38,0"),
          "line 4: \"-3.5e38\" in column 2 \"q\" is too large for a 32-bit number"},
-        {WithRow("2001-01-03,\"1,234.5\",0"), "line 4: \"1,234.5\" in column 2 \"q\" is no number"},
-        {WithRow("2001-01-03,1 234,0"), "line 4: \"1 234\" in column 2 \"q\" is no number"},
+        {WithRow("2001-01-03,\"1,234.5\",0"), "line 4: \"1,234.5\" in column 2 \"q\" has thousands "
+                                              "separators, which are not read; export the table "
+                                              "without them"},
+        {WithRow("2001-01-03,1 234,0"), "line 4: \"1 234\" in column 2 \"q\" has thousands "
+                                        "separators, which are not read; export the table "
+                                        "without them"},
         {WithRow("2001-01-03,1.2.3,0"), "line 4: \"1.2.3\" in column 2 \"q\" is no number"},
         {WithRow("2001-01-03,<0.5,0"),
          "line 4: \"<0.5\" in column 2 \"q\" is a bound and not a value; leave such rows out with "
@@ -88,8 +92,9 @@ TEST(TableRefusal, SaysWhatToGiveWhereTheTableLeavesItOpen) {
     ImportOptions twoTables;
     CheckAll({
         {"rain\n0\n2.3\n1.3\n",
-         "no column holds dates or times; name one with --time, or give the time of the first row "
-         "and the step with --start DATE --step S"},
+         "no column holds dates or times; name one with --time (and --time-format, such as excel "
+         "or "
+         "unix), or give the time of the first row and the step with --start DATE --step S"},
         {"Year,Day,Hour,Prec\n49,1,2,0\n49,1,3,0\n49,1,24,5\n",
          "the columns give year and day but no month; give it with --start YYYY-MM-DD (the date of "
          "the first row)"},
@@ -110,6 +115,18 @@ TEST(TableRefusal, SaysWhatToGiveWhereTheTableLeavesItOpen) {
              options.step = "1d";
              return options;
          }()},
+    });
+}
+
+TEST(TableRefusal, RefusesThousandsSeparatorsRatherThanMisreadThem) {
+    CheckAll({
+        {"Timestamp,Stage (ft)\n1/1/2000 12:00:00 AM,\"1,005.80\"\n"
+         "1/13/2000 1:00:00 PM,\"1,014.01\"\n",
+         "line 2: \"1,005.80\" in column 2 \"Stage\" has thousands separators, which are not read; "
+         "export the table without them (2 rows cannot be read: lines 2, 3)"},
+        {"d;v\n2001-01-01;999,5\n2001-01-02;1.002,25\n2001-01-03;12,5\n2001-01-04;3,5\n",
+         "line 3: \"1.002,25\" in column 2 \"v\" has thousands separators, which are not read; "
+         "export the table without them"},
     });
 }
 
@@ -154,6 +171,7 @@ TEST(TableRefusal, RefusesWhatIsNoTable) {
         {"\n\n  \n", "has no lines with text"},
         {"time,q\n", "no rows with numbers were found"},
         {"once upon a time\nthere was a river\n", "no rows with numbers were found"},
+        {"x;1.5 e\ny;1.5 e\nz;1.5 e\nfoo bar\nw;2\n", "no rows with numbers were found"},
         {"t,v\n2001-01-01,NA\n2001-01-02,NA\n", "no column holds measured numbers; name one with "
                                                 "--item if there is"},
         {std::string("t,v\n2001-01-01,1\n2001-01-02,\0", 29) + "1\n",
