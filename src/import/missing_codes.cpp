@@ -193,11 +193,12 @@ long Replace(float code, std::vector<float>* series) {
     return count;
 }
 
-void TakeAnnounced(const TableLayout& layout, std::vector<float>* series, ImportReport* report) {
+void TakeAnnounced(const TableLayout& layout, const std::string& where, std::vector<float>* series,
+                   ImportReport* report) {
     for (const AnnouncedCode& code : layout.announced) {
         const long count = Replace(code.value, series);
-        report->missing.push_back(
-            {ShortestText(code.value), count, "announced in line " + std::to_string(code.line)});
+        report->missing.push_back({ShortestText(code.value), count,
+                                   where + "announced in line " + std::to_string(code.line)});
     }
 }
 
@@ -217,14 +218,18 @@ void NoteDoubtful(const Extreme& code, const std::string& column, ImportReport* 
 void TakeOutCodes(const TableLayout& layout, TableSamples* samples, ImportReport* report) {
     for (std::size_t i = 0; i < samples->values.size(); ++i) {
         std::vector<float>* series = &samples->values[i];
-        TakeAnnounced(layout, series, report);
+        // One item needs no word on which column it is.
+        const std::string column = ColumnTitle(layout, layout.items[i]);
+        const std::string where =
+            samples->values.size() > 1 ? "in column " + column + ", " : std::string();
+        TakeAnnounced(layout, where, series, report);
         const CodeSearch search(*series);
         for (const Extreme& code : search.clear)
             report->missing.push_back(
                 {ShortestText(code.value), Replace(code.value, series),
-                 "far from all other values; --missing none takes it as a value"});
+                 where + "far from all other values; --missing none takes it as a value"});
         for (const Extreme& code : search.doubtful)
-            NoteDoubtful(code, ColumnTitle(layout, layout.items[i]), report);
+            NoteDoubtful(code, column, report);
     }
 }
 
