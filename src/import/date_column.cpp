@@ -51,17 +51,24 @@ std::vector<DateForm> FormsOfTexts(const SampleRows& rows, std::size_t column) {
     return forms;
 }
 
+/// A name for hours or times of day. "Hour Ending" is one; "sunshine hours" only counts them.
+bool IsClockName(const std::string& name) {
+    const std::vector<std::string> words = Words(name);
+    if (words.empty() || name.size() < 2)
+        return false;
+    if (IsOneOf(words.back(), "time|tm|zeit|uhrzeit|tijd|heure|hora|hhmm"))
+        return true;
+    return words.front().size() > 1 && RoleOfName(words.front()) == TimeRole::Hour &&
+           (words.size() == 1 || words.front() != "hours");
+}
+
 /// The role that a column can play as the time of day beside a date: clock times, or numbers under
 /// a name for one.
 std::optional<TimeRole> ClockRole(const TimeSearch& search, std::size_t column) {
     const ColumnLayout& layout = search.rows.Column(column);
     if (layout.kind == ColumnKind::Time && search.IsUsable(column, TimeRole::Clock))
         return TimeRole::Clock;
-    const std::vector<std::string> words = Words(layout.name);
-    const bool isNamed =
-        (layout.name.size() > 1 && RoleOfName(layout.name) == TimeRole::Hour) ||
-        (!words.empty() && IsOneOf(words.back(), "time|tm|zeit|uhrzeit|tijd|heure|hora|hhmm"));
-    if (!isNamed || layout.kind != ColumnKind::Number)
+    if (layout.kind != ColumnKind::Number || !IsClockName(layout.name))
         return std::nullopt;
     for (const TimeRole role : {TimeRole::Hour, TimeRole::HourMinute})
         if (search.IsUsable(column, role))

@@ -109,6 +109,8 @@ std::string SpanText(const ImportReport& report) {
                                        " s"
                                  : MomentText(time);
     };
+    if (report.samples == 1)
+        return text(report.first);
     std::string span = text(report.first) + " to " + text(report.last);
     if (report.equalStep)
         return span + ", every " +
@@ -161,8 +163,8 @@ std::vector<std::string> ReportLines(const ImportReport& report) {
                         " (line " + LineList(rows.firstLines, rows.count) + ")");
     // Without samples nothing was written, and the fault says why.
     if (report.samples > 0)
-        lines.push_back("written: " + std::to_string(report.samples) + " samples, " +
-                        SpanText(report));
+        lines.push_back("written: " + std::to_string(report.samples) +
+                        (report.samples == 1 ? " sample, " : " samples, ") + SpanText(report));
     return lines;
 }
 

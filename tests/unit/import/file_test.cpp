@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 
+#include "support/scratch_directory.h"
 #include "tsq/tsq.h"
 #include "unit/import/import_fixture.h"
 #include "units/units.h"
@@ -38,7 +39,7 @@ class ImportedFile : public testing::Test {
         return files > 0;
     }
 
-    std::string directory = testing::TempDir() + "import_file_test/";
+    std::string directory = test::ScratchDirectory() + "import_file_test/";
     ImportReport report;
 };
 

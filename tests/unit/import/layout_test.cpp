@@ -154,6 +154,10 @@ TEST(TableLayout, JoinsDatesAndTimesThatStandInSeveralColumns) {
          "330,20010201,    1,   60\n",
          "2001-01-31 23:00:00 40; 2001-02-01 50; 2001-02-01 01:00:00 60",
          {"hour 24 is 00:00 of the next day", "item: \"FF\""}},
+        {"hour ending, and hours that are counted",
+         "Date,Hour Ending,sunshine hours\n01/31/2001,23,1\n01/31/2001,24,0\n02/01/2001,1,1\n",
+         "2001-01-31 23:00:00 1; 2001-02-01 0; 2001-02-01 01:00:00 1",
+         {"time: columns 1 \"Date\", 2 \"Hour Ending\"", "item: \"sunshine hours\""}},
         {"parts in any order",
          "obs,month,day,year,Prec\n1,1,1,1900,0\n2,1,2,1900,3\n"
          "3,1,3,1900,0.5\n4,1,4,1900,0\n5,1,5,1900,0\n",
