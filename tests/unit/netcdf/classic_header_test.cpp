@@ -9,12 +9,13 @@
 #include "base/file_access.h"
 #include "netcdf/nc_file.h"
 #include "netcdf/nc_writer.h"
+#include "support/scratch_directory.h"
 
 namespace ryn {
 namespace {
 
 std::string PathOf(const std::string& name) {
-    return testing::TempDir() + "netcdf_" + name;
+    return test::ScratchDirectory() + "netcdf_" + name;
 }
 
 void WriteBytes(const std::string& path, const std::string& bytes) {
@@ -134,7 +135,7 @@ TEST(NetcdfFile, RefusesWhatIsNoNetcdf) {
     EXPECT_FALSE(OpenBytes("").IsOk());
     EXPECT_FALSE(OpenBytes("\x89HDF\r\n\x1a\n and nothing else").IsOk());
     NcFile file;
-    EXPECT_FALSE(NcFile::Open(testing::TempDir(), &file).IsOk());
+    EXPECT_FALSE(NcFile::Open(test::ScratchDirectory(), &file).IsOk());
     EXPECT_FALSE(NcFile::Open("/dev/null", &file).IsOk());
     EXPECT_FALSE(NcFile::Open(PathOf("missing.nc"), &file).IsOk());
     EXPECT_FALSE(NcFile::Open("http://127.0.0.1:9/opened.nc", &file).IsOk());

@@ -8,13 +8,15 @@
 
 #include "netcdf/nc_values.h"
 
+#include "support/scratch_directory.h"
+
 namespace ryn {
 namespace {
 
 /// Values of a variable `v` of four numbers, with NaN shown as -1.
 std::vector<float> Decoded(const std::string& type, const std::string& attributes,
                            const std::string& data, const std::string& kind = "classic") {
-    const std::string base = testing::TempDir() + "values_" + type;
+    const std::string base = test::ScratchDirectory() + "values_" + type;
     std::ofstream(base + ".cdl") << "netcdf v { dimensions: n = 4 ; variables: " << type
                                  << " v(n) ;\n"
                                  << attributes << "\ndata: v = " << data << " ; }";

@@ -8,6 +8,8 @@
 
 #include "unit/tsq/series_fixture.h"
 
+#include "support/scratch_directory.h"
+
 namespace ryn {
 namespace {
 
@@ -70,7 +72,7 @@ TEST(HostileFile, IsNoNetcdf) {
     EXPECT_FALSE(ReadsAll("Date,Value\n1990-01-01,3.5\n"));
     EXPECT_FALSE(ReadsAll(""));
     EXPECT_FALSE(ReadsAll(std::string(4096, '\0')));
-    EXPECT_NE(Reading(testing::TempDir()).result, 0);
+    EXPECT_NE(Reading(test::ScratchDirectory()).result, 0);
     EXPECT_NE(Reading("").result, 0);
     const std::string pipe = PathOf("pipe");
     ::mkfifo(pipe.c_str(), 0600);

@@ -5,6 +5,8 @@
 
 #include "unit/tsq/series_fixture.h"
 
+#include "support/scratch_directory.h"
+
 namespace ryn {
 namespace {
 
@@ -100,7 +102,7 @@ TEST(CopyFile, CopiesBytesOnDiskAndNamesWhatFails) {
     ASSERT_TRUE(tsqCopyFile(PathOf("from.tsq0"), PathOf("to.tsq0")).IsOk());
     EXPECT_EQ(Bytes(PathOf("to.tsq0")), Bytes(PathOf("from.tsq0")));
     EXPECT_FALSE(tsqCopyFile(PathOf("missing.tsq0"), PathOf("to.tsq0")).IsOk());
-    EXPECT_FALSE(tsqCopyFile(PathOf("from.tsq0"), testing::TempDir()).IsOk());
+    EXPECT_FALSE(tsqCopyFile(PathOf("from.tsq0"), test::ScratchDirectory()).IsOk());
     EXPECT_EQ(Reading(PathOf("to.tsq0")).Steps(), kTwo);
 }
 

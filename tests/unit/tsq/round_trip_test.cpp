@@ -8,6 +8,8 @@
 
 #include "unit/tsq/series_fixture.h"
 
+#include "support/scratch_directory.h"
+
 namespace ryn {
 namespace {
 
@@ -309,7 +311,7 @@ TEST(DataFile, TellsOfAPathThatCannotBeWrittenWhenItIsMade) {
         EXPECT_GT(line, 0);
         return handled++;
     });
-    for (const std::string& path : {std::string("/dev/full"), testing::TempDir(),
+    for (const std::string& path : {std::string("/dev/full"), test::ScratchDirectory(),
                                     PathOf("missing/series.tsq0"), std::string("")}) {
         EXPECT_NE(tsqFileCreate(path, header.get(), &file), 0) << path;
         EXPECT_EQ(file, nullptr);

@@ -10,13 +10,14 @@
 #include <gtest/gtest.h>
 
 #include "base/file_access.h"
+#include "support/scratch_directory.h"
 #include "tsq/tsq.h"
 #include "units/units.h"
 
 namespace ryn::test {
 
 inline std::string PathOf(const std::string& name) {
-    return testing::TempDir() + "tsq_" + name;
+    return test::ScratchDirectory() + "tsq_" + name;
 }
 
 /// One step of a file that is written or was read: its time, and the values of all items.

@@ -8,6 +8,7 @@
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
+#include "support/scratch_directory.h"
 #include "units/unit_table.h"
 #include "units/units.h"
 
@@ -168,7 +169,7 @@ TEST(UnitsDeathTest, AMissingDatabaseIsAFailureThatNamesItsPlace) {
 }
 
 TEST(UnitsDeathTest, ADecimalCommaDoesNotReachTheDatabase) {
-    const std::string locales = testing::TempDir() + "units_locale";
+    const std::string locales = test::ScratchDirectory() + "units_locale";
     std::filesystem::create_directories(locales);
     const std::string make = "localedef -i de_DE -f UTF-8 " + locales + "/de_DE.UTF-8 2>/dev/null";
     if (std::system(make.c_str()) != 0 && !std::filesystem::exists(locales + "/de_DE.UTF-8"))
