@@ -37,6 +37,7 @@ std::string Padded(std::int64_t value, std::size_t width) {
     return digits.size() < width ? std::string(width - digits.size(), '0') + digits : digits;
 }
 
+/// Midnight at the start of the parts' day.
 TimeResult DayOf(const TimeParts& parts, const TimeDefaults& defaults, Millis* start) {
     const int year = parts.year >= 0 ? parts.year : defaults.year;
     if (year < kFirstYear || year > kLastYear)

@@ -24,6 +24,7 @@ std::vector<DateForm> FittingForms(const SampleRows& rows, std::size_t column,
     return fitting;
 }
 
+/// Dates in digits alone. Whole numbers of other lengths are values.
 std::vector<DateForm> FormsOfNumbers(const SampleRows& rows, std::size_t column) {
     bool isDigits = false;
     for (const unsigned size : {8U, 10U, 12U, 14U})
@@ -37,6 +38,7 @@ std::vector<DateForm> FormsOfNumbers(const SampleRows& rows, std::size_t column)
     return forms;
 }
 
+/// Dates with signs between, or with a clock behind their digits.
 std::vector<DateForm> FormsOfTexts(const SampleRows& rows, std::size_t column) {
     std::vector<DateForm> forms =
         FittingForms(rows, column,
@@ -76,6 +78,7 @@ std::optional<TimeRole> ClockRole(const TimeSearch& search, std::size_t column) 
     return std::nullopt;
 }
 
+/// The nearest column from the left that gives the time of day, with the minutes beside its hours.
 void AddClock(const TimeSearch& search, TimeLayout* time) {
     const std::size_t date = time->columns[0].column;
     for (const std::size_t column : search.columns) {

@@ -3,7 +3,7 @@
 #include <algorithm>
 
 #include "import/record_reader.h"
-#include "import/table_text.h"
+#include "import/table_shape.h"
 #include "import/time_reader.h"
 
 namespace ryn {
@@ -38,8 +38,10 @@ Status DecideDateOrder(TextSource& source, TableLayout* layout) {
     ReadResult result = reader.SkipLines(layout->dataLine - 1);
     while (forms.size() > 1 && result == ReadResult::Found) {
         result = reader.ReadLine(&record);
-        if (result == ReadResult::Found)
-            result = reader.Split(&record, &fields);
+        if (result != ReadResult::Found ||
+            CommentMarkSize(record.text, layout->commentMarks) > 0) // quotes mean nothing there
+            continue;
+        result = reader.Split(&record, &fields);
         if (result == ReadResult::Found)
             Narrow(fields.All(), layout->time, &forms);
     }

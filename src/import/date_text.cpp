@@ -24,6 +24,7 @@ struct DateTokens {
     char separator = '\0'; ///< ' ' where a month's name stands
 };
 
+/// Digits, or a month's name.
 bool TakeToken(TextCursor* cursor, DateToken* token) {
     if (IsDigit(cursor->Peek())) {
         // Five digits and more are no part of a separated date.
@@ -99,6 +100,8 @@ bool IsPartOfDate(const DateTokens& date) {
            (date.token[1].digits == 4 && date.token[0].digits <= 2 && date.token[0].value <= 12);
 }
 
+/// The pieces in the order of the form; false where one cannot be what it should. The number of its
+/// digits tells a year from a day, so that a form is not read as another by chance.
 bool AssignTokens(const DateTokens& date, DateForm form, TimeParts* parts) {
     const auto& [a, b, c] = date.token;
     switch (form) {
@@ -146,6 +149,7 @@ int TwoDigits(std::string_view text, std::size_t position) {
     return (text[position] - '0') * 10 + (text[position + 1] - '0');
 }
 
+/// Eight digits of the date; ten, twelve or fourteen with the hour, minute and second.
 TimeResult ParseCompact(std::string_view text, DateForm form, TimeParts* parts) {
     std::size_t digits = 0;
     while (digits < text.size() && IsDigit(text[digits]))
@@ -174,6 +178,7 @@ TimeResult ParseCompact(std::string_view text, DateForm form, TimeParts* parts) 
     return parts->month == 0 || parts->day == 0 ? TimeResult::Incomplete : TimeResult::Ok;
 }
 
+/// The year with four digits, or a month's name, tells which is which.
 TimeResult ParseYearMonth(std::string_view text, TimeParts* parts) {
     TextCursor cursor(text);
     DateTokens date;
@@ -218,6 +223,7 @@ TimeResult SetWhole(std::optional<Millis> moment, TimeParts* parts) {
     return moment ? TimeResult::Ok : TimeResult::Bad;
 }
 
+/// Decimal years, serial numbers of spreadsheets, seconds: one number for the whole moment.
 TimeResult ParseCounted(std::string_view text, DateForm form, TimeParts* parts) {
     std::string plain(text.substr(0, 40));
     for (char& c : plain)

@@ -60,6 +60,7 @@ class DifReader {
     std::int64_t taken = 0;
 };
 
+/// "19760101" and "2300".
 std::optional<Millis> MomentOfFields(std::string_view date, std::string_view clock) {
     TimeParts parts;
     Millis moment = 0;

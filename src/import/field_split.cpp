@@ -16,6 +16,7 @@ bool Divides(char c, char delimiter) {
     return delimiter == kBlanks ? IsBlank(c) : c == delimiter;
 }
 
+/// A tab is no blank where it is the delimiter.
 std::size_t SkipBlanks(std::string_view record, std::size_t position, char delimiter) {
     while (position < record.size() && IsBlank(record[position]) && record[position] != delimiter)
         ++position;

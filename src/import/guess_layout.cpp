@@ -25,6 +25,7 @@ RowRun LongestRun(const std::vector<RowRun>& runs) {
     return best;
 }
 
+/// "16", or "3-12".
 std::string LinesText(const TableShape& shape, const RowRun& run) {
     const long first = shape.rows[run.first].line;
     const long last = shape.rows[run.last].line;
@@ -56,6 +57,7 @@ Status CheckOtherRuns(const TableShape& shape, const std::vector<RowRun>& runs,
     return Status::Ok();
 }
 
+/// Dates that lack their day count: their rows belong to the table, and are left out later.
 bool ReadsAsTime(const TimeLayout& time, const HeadRow& row) {
     Millis moment = 0;
     return TimeReader(time).Read(row.Views(), &moment) != TimeResult::Bad;
@@ -78,6 +80,7 @@ std::size_t WithFaultyRowsBefore(const TableShape& shape, const TimeLayout& time
     return first;
 }
 
+/// By the first row, which stands for the others: a form allows two digits or four in each row.
 bool HasTwoDigitYears(const SampleRows& rows, const TimeLayout& time) {
     if (time.source != TimeSource::Columns)
         return false;
@@ -100,6 +103,7 @@ bool HasTwoDigitYears(const SampleRows& rows, const TimeLayout& time) {
     return false;
 }
 
+/// Rules that place values at moments which the table does not write; the user has to know them.
 void NoteTimeRules(const SampleRows& rows, const ImportSettings& settings, TableLayout* layout) {
     const TimeLayout& time = layout->time;
     if (HasTwoDigitYears(rows, time) || (time.pattern && time.pattern->Has("y")))
@@ -190,6 +194,7 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
     return status;
 }
 
+/// The layout is set only when all of it was found.
 Status GuessFromHead(const TableHead& head, const ImportSettings& settings, TableLayout* layout) {
     const std::optional<TableShape> shape = FindShape(head, settings);
     if (!shape)

@@ -43,6 +43,7 @@ void NameItems(const ImportSettings& settings, const std::string& fallbackName,
     }
 }
 
+/// The items as the table calls them; names that are missing follow.
 void DescribeItems(const TableLayout& layout, ImportReport* report) {
     for (const std::size_t item : layout.items) {
         const ColumnLayout& column = layout.columns[item];
@@ -72,6 +73,8 @@ Status ReadPlainTable(TextSource& source, const ImportSettings& settings, TableS
     return status;
 }
 
+/// An empty series would be a file that no analysis can use. The codes show when a guess took too
+/// much.
 Status NoValues(const std::string& source, const ImportReport& report) {
     std::string codes;
     for (const OccurredText& code : report.missing)
@@ -83,6 +86,7 @@ Status NoValues(const std::string& source, const ImportReport& report) {
                               (codes.empty() ? "" : "; taken for missing" + codes));
 }
 
+/// What all sources have in common: samples without missing values, in rising order.
 Status Finish(const std::string& source, const ImportSettings& settings, TableSamples* samples,
               ImportReport* report) {
     // Before the order is judged: a time that is repeated without a value, as archives do to fill

@@ -119,6 +119,7 @@ Status ParseDuplicates(const std::string& text, DuplicateRule* rule) {
     return Unknown("duplicates", text, "refuse, first, last or max");
 }
 
+/// Empty codes count: a user says with "" that blank lines are missing values.
 void ParseMissing(const std::vector<std::string>& codes, MissingRules* rules) {
     // Who gives codes knows them: looking for others as well could take away values.
     rules->searchCodes = codes.empty();

@@ -57,6 +57,7 @@ void AddLayout(const TableLayout& layout, Lines* lines) {
     lines->push_back(FormOfTime(layout));
 }
 
+/// A unit that is unknown is told as well, since an analysis without one cannot be compared.
 void AddItems(const ImportReport& report, Lines* lines) {
     for (const ImportedItem& item : report.items) {
         std::string text = "item: " + Quoted(item.name);
@@ -69,6 +70,7 @@ void AddItems(const ImportReport& report, Lines* lines) {
         lines->push_back("could be chosen with --item: " + Joined(report.otherItems));
 }
 
+/// With the reason where a number was taken for a code, and the way to have it otherwise.
 void AddMissing(const ImportReport& report, Lines* lines) {
     // Codes that were announced but never occur are told too: a user may have expected them.
     for (const OccurredText& code : report.missing) {

@@ -33,6 +33,8 @@ struct ColumnValues {
     bool areWhole = true;
 };
 
+/// The values of the rows looked at, and whether all are written without decimals ("5.0" is
+/// measured, "5" may count).
 ColumnValues ValuesOf(const SampleRows& rows, std::size_t column) {
     ColumnValues found;
     for (const auto& fields : rows.All()) {
@@ -73,6 +75,7 @@ enum class Standing {
     Unchanging,   ///< a station's number, a counter
 };
 
+/// Values are looked at before names: a station's number is constant whatever it is called.
 Standing StandingOf(const SampleRows& rows, std::size_t column) {
     const ColumnValues values = ValuesOf(rows, column);
     const std::string& name = rows.Column(column).name;
@@ -114,6 +117,7 @@ std::vector<std::size_t> MonthColumns(const TableLayout& layout) {
     return months.size() == kMonths ? months : std::vector<std::size_t>();
 }
 
+/// As the user says, also where the column looks like a label, or is empty in the rows looked at.
 Status ChooseNamed(const ImportSettings& settings, TableLayout* layout) {
     for (const std::string& name : settings.itemColumns) {
         const std::optional<std::size_t> column = FindColumn(layout->columns, name);

@@ -8,6 +8,7 @@ namespace ryn {
 
 namespace {
 
+/// Counts a text; from a number of different ones on, the rest counts with the last.
 void CountText(std::string_view text, std::vector<OccurredText>* texts) {
     constexpr std::size_t kMostTexts = 20; // a hostile table may have a new one in each row
     const std::string shown = ShownText(text);

@@ -9,6 +9,7 @@ namespace {
 
 constexpr std::size_t kBlock = std::size_t{1} << 18;
 
+/// These are converted while they are read, so that everything behind sees one byte a character.
 bool IsUtf16(TextEncoding encoding) {
     return encoding == TextEncoding::Utf16LittleEndian || encoding == TextEncoding::Utf16BigEndian;
 }

@@ -57,11 +57,13 @@ std::string DigitsOf(float value) {
     return digits;
 }
 
+/// One of these digits, so many times or more, and nothing else.
 bool IsRepeatedDigit(const std::string& digits, std::string_view which, std::size_t least) {
     return digits.size() >= least && which.find(digits[0]) != std::string_view::npos &&
            digits.find_first_not_of(digits[0]) == std::string::npos;
 }
 
+/// Nothing on earth is measured in such numbers; netCDF's and most models' fill values lie here.
 bool IsHuge(float value) {
     return std::abs(value) >= 1e19F;
 }
@@ -76,6 +78,7 @@ bool IsRoundedNines(float value) {
     return std::abs(value) >= 1e8F && DigitsOf(value) == "1";
 }
 
+/// By its look alone; whether it is one depends on the other values.
 bool IsLowCode(float value) {
     if (value >= 0.0F)
         return false;
@@ -103,6 +106,8 @@ struct Rest {
     }
 };
 
+/// Negative codes. In a series without other negative values (discharge, rain) a code needs little
+/// proof, in others it has to lie far outside.
 bool IsClearLow(const Extreme& code, const Rest& rest, bool isFine) {
     if (IsHuge(code.value) || rest.isEmpty)
         return code.value != -1.0F && code.value != -9.0F;
@@ -116,6 +121,8 @@ bool IsClearLow(const Extreme& code, const Rest& rest, bool isFine) {
     return rest.low - code.value > rest.high - rest.low;
 }
 
+/// Nines. High values are what an extreme value analysis is about, so that the proof has to be
+/// strong: repeated, and further off than the whole series spreads or is high.
 bool IsClearHigh(const Extreme& code, const Rest& rest) {
     if (IsHuge(code.value))
         return true;
@@ -193,6 +200,7 @@ long Replace(float code, std::vector<float>* series) {
     return count;
 }
 
+/// Announced codes are taken whatever the other values are, and told even if they never occur.
 void TakeAnnounced(const TableLayout& layout, const std::string& where, std::vector<float>* series,
                    ImportReport* report) {
     for (const AnnouncedCode& code : layout.announced) {
@@ -202,6 +210,7 @@ void TakeAnnounced(const TableLayout& layout, const std::string& where, std::vec
     }
 }
 
+/// Values that look like codes stay, but the user is asked to look.
 void NoteDoubtful(const Extreme& code, const std::string& column, ImportReport* report) {
     const bool isLong = DigitsOf(code.value).size() >= 4 || IsRoundedNines(code.value);
     if (code.count < 3 && !isLong)

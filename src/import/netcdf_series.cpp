@@ -77,6 +77,7 @@ ItemInfo InfoOf(TsqHeader* header, int number) {
     return info;
 }
 
+/// By number from 1, else by name in any case.
 std::optional<int> FindItem(TsqHeader* header, const std::string& nameOrNumber) {
     const int count = tsqGetNoOfItems(header);
     const std::optional<int> number = ParseInt(nameOrNumber);
@@ -144,6 +145,7 @@ void ApplyGivenCodes(const MissingRules& missing, float* value, ImportReport* re
     *value = kNoValue;
 }
 
+/// Step by step, which the store turns into blocks.
 Status ReadSteps(const std::string& path, const Axis& axis, const std::vector<int>& chosen,
                  const ImportSettings& settings, TsqHeader* header, TsqFile* file,
                  TableSamples* samples, ImportReport* report) {

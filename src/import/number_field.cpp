@@ -29,6 +29,8 @@ bool IsOnlySigns(std::string_view field) {
                        [](char c) { return c == '-' || c == '*' || c == '.' || c == ':'; });
 }
 
+/// Letters and signs that gauge networks put behind a value. Digits and separators are none, or a
+/// mistyped number would lose its end.
 bool IsMark(std::string_view text) {
     constexpr std::size_t kLongestMark = 3;
     return !text.empty() && text.size() <= kLongestMark &&
@@ -93,6 +95,7 @@ NumberField OutOfRange(const PlainNumber& number, const char* stop) {
     return {NumberKind::TooLarge, 0.0F, {}};
 }
 
+/// A number from the start of the field, and a mark or nothing behind it.
 NumberField ReadPlain(const PlainNumber& number, std::string_view field) {
     NumberField result{NumberKind::Value, 0.0F, {}};
     const auto [stop, error] = std::from_chars(number.begin(), number.end(), result.value);

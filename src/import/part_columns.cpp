@@ -70,6 +70,8 @@ TimeLayout SideBySide(std::size_t first, const std::vector<TimeRole>& roles) {
     return time;
 }
 
+/// Years with four digits, and rising times in nearly all rows: three whole numbers side by side
+/// are common, three that make rising dates are not. A column has to be left for values.
 bool Fits(const TimeSearch& search, const TimeLayout& probe) {
     if (probe.columns.back().column + 1 >= search.rows.ColumnCount())
         return false;

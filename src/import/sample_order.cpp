@@ -26,6 +26,7 @@ void SortByTime(TableSamples* samples) {
     }
 }
 
+/// Into the sample kept. The first one's values are there already.
 void Merge(std::size_t from, std::size_t to, DuplicateRule rule, TableSamples* samples) {
     for (std::vector<float>& item : samples->values) {
         if (rule == DuplicateRule::Last)

@@ -77,6 +77,7 @@ Fields AsTitles(const TableShape& shape, const HeadRow& row) {
     return fields.size() == count ? fields : Fields();
 }
 
+/// Words above the columns, and no row or line of a preamble that happens to have as many fields.
 bool HasTitles(const TableShape& shape, const HeadRow& row, const Fields& titles) {
     if (titles.empty() || row.isDivider)
         return false;
@@ -182,6 +183,7 @@ std::optional<float> CodeNear(const std::string& text, std::size_t mention) {
     return nearest;
 }
 
+/// A code that was announced twice counts once.
 void FindCode(const HeadRow& row, std::vector<AnnouncedCode>* codes) {
     const std::size_t mention = MentionOfMissing(row.text);
     if (mention == std::string::npos)

@@ -19,6 +19,8 @@ constexpr double kMost = 0.8;
 constexpr std::size_t kMostJoinedLines = 20;
 constexpr std::size_t kMostJoinedBytes = std::size_t{1} << 24;
 
+/// In any of the forms that have a sign in them; dates in digits alone are numbers here, which a
+/// column's rows together tell apart.
 bool LooksLikeTime(std::string_view field) {
     constexpr std::size_t kLongestTime = 40;
     constexpr DateForm kForms[] = {DateForm::YearMonthDay, DateForm::DayMonthYear,
@@ -168,6 +170,7 @@ double WeighFieldCounts(const TableShape& shape, std::size_t* fieldCount) {
     return best;
 }
 
+/// What most rows hold that hold anything.
 ColumnKind KindOfColumn(const std::vector<const HeadRow*>& rows, std::size_t column, char decimal) {
     std::map<FieldKind, double> counts;
     for (const HeadRow* row : rows)
@@ -214,6 +217,7 @@ std::vector<std::string> CommentMarks(const ImportSettings& settings, char delim
 
 enum class FieldMatch { Yes, No, Free };
 
+/// Columns of text or nothing fit any field, and a missing value fits any column.
 FieldMatch MatchField(ColumnKind kind, std::string_view field, char decimal) {
     if (kind == ColumnKind::Text || kind == ColumnKind::Empty)
         return FieldMatch::Free;

@@ -4,6 +4,8 @@
 #include <array>
 #include <cstdint>
 
+#include "import/table_text.h"
+
 namespace ryn {
 
 namespace {
@@ -37,6 +39,7 @@ void AppendUtf8(unsigned code, std::string* text) {
     }
 }
 
+/// Of a UTF-8 sequence by its first byte; 0 for a byte that begins none.
 std::size_t SequenceLength(unsigned lead) {
     if (lead < 0x80)
         return 1;
@@ -77,13 +80,6 @@ bool ZerosAtEveryOther(std::string_view text, std::size_t first) {
         others += text[2 * i + 1 - first] == '\0' ? 1 : 0;
     }
     return pairs >= 4 && others == 0 && zeros * 10 >= pairs * 9;
-}
-
-std::string Lowercase(std::string_view text) {
-    std::string lower(text);
-    for (char& c : lower)
-        c = c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
-    return lower;
 }
 
 } // namespace

@@ -46,6 +46,7 @@ std::size_t BlankCount(const std::string& text) {
     return static_cast<std::size_t>(std::count(text.begin(), text.end(), ' '));
 }
 
+/// The columns given, joined; else the first ones that read as the pattern.
 Status FindPattern(const SampleRows& rows, const ImportSettings& settings,
                    const std::vector<std::size_t>& given, TableLayout* layout) {
     if (Status status = CheckPattern(settings); !status)
@@ -74,6 +75,7 @@ Status FindPattern(const SampleRows& rows, const ImportSettings& settings,
                               Quoted(settings.pattern->Text()) + "; name the column with --time");
 }
 
+/// Forms that are plain numbers, in the first column that fits them.
 Status FindSerial(const SampleRows& rows, const ImportSettings& settings,
                   const std::vector<std::size_t>& candidates, TableLayout* layout) {
     for (const std::size_t column : candidates) {
@@ -87,6 +89,7 @@ Status FindSerial(const SampleRows& rows, const ImportSettings& settings,
                               "; name the column with --time");
 }
 
+/// What to do depends on what was found and on what the user gave.
 Status NoTime(PartsResult parts, const ImportSettings& settings, const TableLayout& layout) {
     if (parts == PartsResult::NoMonth)
         return Status::InputFault("the columns give year and day but no month; give it with "
@@ -118,6 +121,7 @@ void UseStep(const ImportSettings& settings, TableLayout* layout) {
     time.step = *settings.step;
 }
 
+/// A column that was named for the time and left over would be a misunderstanding.
 Status CheckAllUsed(const std::vector<std::size_t>& given, const TableLayout& layout) {
     for (const std::size_t column : given)
         if (std::none_of(layout.time.columns.begin(), layout.time.columns.end(),
@@ -136,6 +140,8 @@ bool LacksMonth(const TimeLayout& time) {
     return has(TimeRole::Day) && !has(TimeRole::Month);
 }
 
+/// Whole dates before dates in parts, parts before months, years and lengths: the more a reading
+/// says, the less likely it is chance.
 Status Search(const SampleRows& rows, const ImportSettings& settings,
               const std::vector<std::size_t>& given, TableLayout* layout) {
     // The user's columns alone, when given: what they do not hold is a fault, not a reason to look

@@ -48,6 +48,7 @@ bool TakeFraction(TextCursor* cursor, TimeParts* parts) {
     return count > 0;
 }
 
+/// Up to the next blank.
 bool TakeZone(TextCursor* cursor, TimeParts* parts) {
     const std::string_view rest = cursor->Rest();
     const std::string_view zone = rest.substr(0, rest.find(' '));
@@ -59,6 +60,7 @@ bool TakeZone(TextCursor* cursor, TimeParts* parts) {
     return true;
 }
 
+/// Behind the hour, as everybody writes it.
 bool TakeHalfOfDay(TextCursor* cursor, TimeParts* parts) {
     const std::string_view word = cursor->TakeWord();
     const bool isAfternoon = IsOneOf(word, "pm");

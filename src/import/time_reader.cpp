@@ -33,6 +33,7 @@ bool ReadYear(std::string_view field, int* year) {
     return true;
 }
 
+/// "0", "30", "1230", "2400".
 bool ReadHourMinute(std::string_view field, TimeParts* parts) {
     int value = 0;
     if (!ReadWhole(field, 2400, &value))

@@ -67,6 +67,7 @@ bool LooksLikeDecimalYears(const SampleRows& rows, std::size_t column) {
     return hasFraction;
 }
 
+/// They have to rise: values between 1500 and 2200 with decimals are common too.
 bool FindDecimalYears(const TimeSearch& search, TimeLayout* time) {
     for (const std::size_t column : search.columns) {
         *time = DateLayout(column, DateForm::DecimalYear);
@@ -77,6 +78,7 @@ bool FindDecimalYears(const TimeSearch& search, TimeLayout* time) {
     return false;
 }
 
+/// 0 for what is no unit of time, months and years included: they have no fixed length.
 Millis UnitMillis(std::string_view unit) {
     const std::string text = Lowercase(Trimmed(unit));
     const std::optional<TimeStep> step = ParseTimeStep("1 " + text);
@@ -115,6 +117,7 @@ bool FindElapsed(const TimeSearch& search, TimeLayout* time) {
 
 } // namespace
 
+/// The whole of the rows, since one that does not fit may decide between two forms.
 TimeFit FitTime(const SampleRows& rows, const TimeLayout& time) {
     TimeReader reader(time);
     TimeFit fit;

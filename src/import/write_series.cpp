@@ -56,6 +56,7 @@ int SetAxis(const TableSamples& samples, std::optional<Millis> step, TsqHeader* 
                                 Seconds(samples.times[0] - *origin), Seconds(*step), kAxisIndex);
 }
 
+/// Name, unit and the kind of quantity that the unit suggests.
 int DescribeItems(TsqHeader* header, ImportReport* report) {
     int result = 0;
     for (std::size_t i = 0; i < report->items.size() && result == 0; ++i) {
@@ -72,6 +73,7 @@ int DescribeItems(TsqHeader* header, ImportReport* report) {
     return result;
 }
 
+/// All items of a step, then the next step, as the store wants them.
 int WriteSteps(const TableSamples& samples, Millis origin, TsqHeader* header, TsqFile* file) {
     int result = 0;
     for (std::size_t i = 0; i < samples.Count() && result == 0; ++i) {
@@ -83,6 +85,7 @@ int WriteSteps(const TableSamples& samples, Millis origin, TsqHeader* header, Ts
     return result;
 }
 
+/// The store's own words, which name the file and the reason.
 Status LastError(const std::string& path) {
     const Status error = tsqTakeError();
     return error ? Status::SystemFault(path + ": the data file could not be written") : error;

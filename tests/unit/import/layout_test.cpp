@@ -309,6 +309,7 @@ TEST(TableLayout, SearchesTheWholeTableForTheRowThatTellsDayFromMonth) {
     std::string text = "d,v\n";
     for (int year = 1000; year < 6000; ++year)
         text += "1/2/" + std::to_string(year) + ",1\n";
+    text += "# \"a remark that opens a quote\n";
     Imported undecided(text);
     ExpectContains(undecided.Samples(), "day-month-year or month-day-year, and no row decides");
     Imported decided(text + "31/12/6000,2\n");
