@@ -1,5 +1,6 @@
 #include "stats/fit_outcome.h"
 
+#include <array>
 #include <charconv>
 #include <cmath>
 
@@ -9,6 +10,8 @@ namespace {
 
 // to_chars knows no locale: the log has a decimal point everywhere.
 std::string ThreeDecimals(double value) {
+    if (std::isnan(value))
+        return "nan"; // whose sign differs between machines
     // The largest double has 309 digits before the point.
     std::array<char, 320> buffer{};
     const auto end = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value,
