@@ -198,12 +198,16 @@ constexpr std::array kEntries = std::to_array<Entry>({
      "%s: %d 行目: \"%s\" は数値ではありません"},
     {kTextCliNoNumbers, "%s: there are no numbers", "%s: 数値がありません"},
     {kTextCliDecimalComma,
-     "%s: every line reads \"digits,digits\", which is a decimal comma or two columns; write a "
-     "decimal point, or separate columns with blanks",
-     "%s: "
-     "すべての行が「数字,"
-     "数字」の形で、小数点のコンマか二つの列か区別できません。小数点にはピリオドを、列の区切りには"
-     "空白を使ってください"},
+     "%s: every line reads \"digits,digits\", which is a decimal comma or two columns; give one "
+     "column with decimal points",
+     "%s: すべての行が「数字,数字」で、小数点のコンマか 2 列かを区別できません。"
+     "小数点にピリオドを使った 1 列で与えてください"},
+    {kTextCliSeveralColumns,
+     "%s: line %d has several columns, and a first column is often the year; give the values "
+     "alone, "
+     "or import the table and fit its data file",
+     "%s: %d 行目に複数の列があります。先頭の列は年であることが多いため、値だけを与えるか、"
+     "表を取り込んでそのデータファイルに当てはめてください"},
     {kTextCliHeadingPassed, "%s: the first line is taken as a heading: %s",
      "%s: 1 行目を見出しとみなしました: %s"},
     {kTextCliRateWithoutPds,
@@ -270,9 +274,8 @@ constexpr std::array kEntries = std::to_array<Entry>({
      "書き出す表。指定がなければ標準出力"},
     {kTextCliHelpFitName, "Distribution and estimation method, such as GEV/LMOM",
      "分布と母数推定法（例: GEV/LMOM）"},
-    {kTextCliHelpFitValues,
-     "Text with one number a line, or numbers in the first column; data file; - for standard input",
-     "1 行に一つの数値（または先頭列が数値）のテキスト、データファイル、または標準入力を表す -"},
+    {kTextCliHelpFitValues, "Text with one number a line; data file; - for standard input",
+     "1 行に一つの数値のテキスト、データファイル、または標準入力を表す -"},
     {kTextCliHelpFitItem, "Item of a data file, from 1; else the first",
      "データファイルの項目番号（1 から）。指定がなければ先頭"},
     {kTextCliHelpFitPeriods, "Return periods in years; else 2,5,10,20,50,100",

@@ -129,6 +129,7 @@ enum TextId : int {
     kTextCliNoNumber,
     kTextCliNoNumbers,
     kTextCliDecimalComma,
+    kTextCliSeveralColumns,
     kTextCliHeadingPassed,
     kTextCliRateWithoutPds,
     kTextCliPdsNeedsRate,

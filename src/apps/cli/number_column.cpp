@@ -1,5 +1,6 @@
 #include "apps/cli/number_column.h"
 
+#include <algorithm>
 #include <cmath>
 
 #include "base/number_text.h"
@@ -18,8 +19,15 @@ std::string_view Trimmed(std::string_view text) {
     return text.substr(first, text.find_last_not_of(kBlanks) - first + 1);
 }
 
+constexpr std::string_view kSeparators = " \t;,";
+
 std::string_view FirstField(std::string_view line) {
-    return Trimmed(line.substr(0, line.find_first_of(" \t;,")));
+    return Trimmed(line.substr(0, line.find_first_of(kSeparators)));
+}
+
+bool HasSeveralFields(std::string_view line) {
+    const std::size_t end = std::min(line.find_first_of(kSeparators), line.size());
+    return line.find_first_not_of(kSeparators, end) != std::string_view::npos;
 }
 
 bool IsDigits(std::string_view text) {
@@ -56,6 +64,8 @@ class ColumnReader {
             return Status::InputFault(
                 FormatText(kTextCliNoNumber, name, lineNumber, std::string(FirstField(line))));
         ambiguous = ambiguous && HasAmbiguousComma(line);
+        if (wideLine == 0 && HasSeveralFields(line))
+            wideLine = lineNumber;
         column.values.push_back(*number);
         return Status::Ok();
     }
@@ -65,6 +75,8 @@ class ColumnReader {
             return Status::InputFault(FormatText(kTextCliNoNumbers, name));
         if (ambiguous)
             return Status::InputFault(FormatText(kTextCliDecimalComma, name));
+        if (wideLine != 0)
+            return Status::InputFault(FormatText(kTextCliSeveralColumns, name, wideLine));
         *result = std::move(column);
         return Status::Ok();
     }
@@ -74,6 +86,7 @@ class ColumnReader {
     NumberColumn column;
     bool ambiguous = true;
     int lineNumber = 0;
+    int wideLine = 0; // the first with several columns
 };
 
 } // namespace

@@ -15,10 +15,10 @@ struct NumberColumn {
     std::string heading;
 };
 
-/// Reads one number a line, or the first column of several between blanks, tabs, semicolons or
-/// commas. Empty lines, and all behind "#", do not count. A first line that is no number is the
-/// heading; any other, and a number that is not finite, is a fault with its line. Lines that are
-/// all "digits,digits" are refused, since a decimal comma cannot be told from two columns there.
+/// Reads one number a line. Empty lines, and all behind "#", do not count. A first line that is no
+/// number is the heading; any other, and a number that is not finite, is a fault with its line. So
+/// is a line of several columns between blanks, tabs, semicolons or commas: the first one of a
+/// table is often the year. Lines that are all "digits,digits" may be that or have a decimal comma.
 /// `name` stands for the text in faults.
 Status ReadNumberColumn(std::string_view text, const std::string& name, NumberColumn* column);
 

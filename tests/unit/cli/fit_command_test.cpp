@@ -20,7 +20,7 @@ std::vector<std::string> KeysOf(const nlohmann::ordered_json& object) {
 }
 
 TEST_F(FitCommand, FitsAColumnOfNumbers) {
-    files.Write("v.txt", "# made by hand\nlevel\n3\n1 ignored\n5\t9\n2;x\n\n4 # last\n");
+    files.Write("v.txt", "# made by hand\nlevel\n3\n1 \n5\t# remark\n2;\n\n4 # last\n");
     ASSERT_EQ(Run({"fit", "gum/lmom", "v.txt", "--json", "--periods", "10,1000"}), 0) << err;
     EXPECT_EQ(err, "ryn: note: v.txt: the first line is taken as a heading: level\n");
     const auto fit = Json();
@@ -104,8 +104,10 @@ TEST_F(FitCommand, RefusesWhatIsNoColumnOfNumbers) {
         {"1\n2x\n", "standard input: line 2: \"2x\" is no number"},
         {"1\n1e400\n", "standard input: line 2: \"1e400\" is no number"},
         {"12,5\n-13,25\n", "standard input: every line reads \"digits,digits\", which is a decimal "
-                           "comma or two columns; write a decimal point, or separate columns with "
-                           "blanks"},
+                           "comma or two columns; give one column with decimal points"},
+        {"Year Level\n1923 4.03\n1924 3.83\n",
+         "standard input: line 2 has several columns, and a first column is often the year; give "
+         "the values alone, or import the table and fit its data file"},
     };
     for (const auto& [text, message] : kTexts) {
         EXPECT_EQ(Run({"fit", "GUM/MOM", "-"}, text), 1) << text;
