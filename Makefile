@@ -9,6 +9,10 @@
 JOBS ?= $(shell nproc)
 FUZZ_SECONDS ?= 600
 
+# Objects of one clone serve the next, wherever it lies.
+export CCACHE_BASEDIR := $(CURDIR)
+export CCACHE_NOHASHDIR := 1
+
 .PHONY: run test build sanitize lint bench fuzz format packages clean
 .DEFAULT_GOAL := build
 

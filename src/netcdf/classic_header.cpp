@@ -96,7 +96,7 @@ std::uint64_t SaturatingSum(std::uint64_t a, std::uint64_t b) {
     return __builtin_add_overflow(a, b, &sum) ? UINT64_MAX : sum;
 }
 
-/// Walks the header in the order of the specification's grammar: number of records, dimensions,
+/// Walks the header in the order of the format's grammar: number of records, dimensions,
 /// attributes of the file, variables with theirs. No count is used before it was tested, so that
 /// neither time nor memory grows beyond what the file's size allows.
 class ClassicHeader {
