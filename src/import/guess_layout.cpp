@@ -1,6 +1,7 @@
 #include "import/guess_layout.h"
 
 #include <algorithm>
+#include <string>
 
 #include "import/date_order.h"
 #include "import/item_columns.h"
@@ -150,6 +151,31 @@ void KeepPreview(const SampleRows& rows, TableLayout* layout) {
         layout->preview.emplace_back(rows.All()[i].begin(), rows.All()[i].end());
 }
 
+bool IsWholeNumber(const std::string& field) {
+    const std::size_t start = !field.empty() && (field[0] == '-' || field[0] == '+') ? 1 : 0;
+    return field.size() > start &&
+           field.find_first_not_of("0123456789", start) == std::string::npos;
+}
+
+/// "2001-01-01,10,5" below "Date,Flow": a comma that parts the columns and the decimals too. The
+/// same shape with decimal points in it is a table whose row names are dates.
+bool CommaPartsDecimalsToo(const TableShape& shape, const RowRun& run) {
+    if (shape.delimiter != ',' || run.first == 0 || shape.fieldCount < 3 ||
+        shape.kinds[0] != ColumnKind::Time || shape.kinds[1] != ColumnKind::Number)
+        return false;
+    const HeadRow& header = shape.rows[run.first - 1];
+    if (header.isComment || header.fields.size() + 1 != shape.fieldCount)
+        return false;
+    const std::size_t end = std::min(run.first + run.count, shape.rows.size());
+    for (std::size_t i = run.first; i < end; ++i) {
+        const auto& fields = shape.rows[i].fields;
+        if (fields.size() == shape.fieldCount &&
+            !(IsWholeNumber(fields[1]) && IsWholeNumber(fields[2])))
+            return false;
+    }
+    return true;
+}
+
 /// The names that the rows' kinds alone suggest, which the search for time columns needs; then the
 /// rows that have a time, and the header above them.
 Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayout* layout) {
@@ -179,6 +205,11 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
         run.first = WithFaultyRowsBefore(shape, time, run.first);
     // Again, since the rows may start elsewhere than the kinds of their fields suggested.
     FindNames(shape, run.first, layout);
+    if (!settings.decimal && CommaPartsDecimalsToo(shape, run))
+        return Status::InputFault("line " + std::to_string(shape.rows[run.first].line) +
+                                  " has a field more than the names above it: a decimal comma may "
+                                  "part its numbers; write decimal points, or say --decimal . if "
+                                  "they are whole numbers");
     ReadPreamble(shape, run.first, layout);
     layout->dataLine = shape.rows[run.first].line;
     const SampleRows rows(shape, run, layout->columns);

@@ -104,6 +104,9 @@ TEST(TableRefusal, SaysWhatToGiveWhereTheTableLeavesItOpen) {
         {"d;v\n2001-01-01;147,000\n2001-01-02;152,500\n2001-01-03;160,250\n",
          "the commas in column 2 \"v\" may part decimals or thousands; if they are decimal commas "
          "say so with --decimal , (thousands separators are not read)"},
+        {"date,q\n2001-01-01,10,0\n2001-01-02,11,7\n2001-01-03,12,4\n",
+         "line 2 has a field more than the names above it: a decimal comma may part its numbers; "
+         "write decimal points, or say --decimal . if they are whole numbers"},
         {"start;end;comment\n2001-01-01;2001-02-01;\n2002-01-01;2002-02-01;\n",
          "no column holds measured numbers; name one with --item if there is"},
         {"rain\n0\n2.3\n\n1.3\n",
