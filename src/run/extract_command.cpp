@@ -38,9 +38,12 @@ ExtractionResult Prepare(CGlobalKvf& root) {
     if (ExtractionResult refused = TestInput(basic); !refused.status)
         return refused;
     // Read before the output is emptied: a bad input must not cost the old series.
-    if (!root.Values().ReadSeries(basic.InputFileName, ItemIndex(basic.InputItem)))
-        return Refused(0, Status::InputFault(FormatText(kTextExtractionInputBad,
-                                                        root.Values().ReadError().Text())));
+    if (!root.Values().ReadSeries(basic.InputFileName, ItemIndex(basic.InputItem))) {
+        const Status& reason = root.Values().ReadError();
+        const std::string text = FormatText(kTextExtractionInputBad, reason.Text());
+        return Refused(0, reason.Kind() == Fault::System ? Status::SystemFault(text)
+                                                         : Status::InputFault(text));
+    }
     if (const Status emptied = EmptyFile(basic.OutputFileName); !emptied)
         return Refused(kTextExtractionOutputUnwritable,
                        Status::SystemFault(std::string(Text(kTextExtractionOutputUnwritable)) +
