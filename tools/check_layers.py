@@ -26,7 +26,7 @@ MAY_USE = {
     "import": {"base", "units", "tsq"},
     "series": {"base", "kvf", "tsq", "units", "strings", "ports"},
     "params": {"base", "kvf", "framework", "series", "tsq"},
-    "results": {"base", "kvf", "controls", "ports"},
+    "results": {"base", "kvf", "framework", "controls", "ports"},
     "document": {"framework", "params", "results", "ports"},
     "run": {"document", "engine", "grid", "tsq", "series", "ports"},
     "desktop": {"framework", "ports"},

@@ -3,10 +3,12 @@
 #include <memory>
 #include <utility>
 
+#include "base/file_access.h"
 #include "base/path_parts.h"
 #include "base/qx_path.h"
 #include "document/dlg_enumerator.h"
 #include "document/parameter_file_name.h"
+#include "results/result_file.h"
 #include "strings/catalogue.h"
 
 namespace ryn {
@@ -17,6 +19,11 @@ CRynEditDoc::CRynEditDoc() {
     auto root = std::make_unique<CGlobalKvf>();
     globalKvf = root.get();
     rootSection = std::move(root);
+}
+
+CRynEditDoc::~CRynEditDoc() {
+    rootSection.reset();
+    enumerator.reset();
 }
 
 const CRuntimeClass& CRynEditDoc::GetRuntimeClass() const {
@@ -32,6 +39,8 @@ CRuntimeClass& CRynEditDoc::RuntimeClass() {
 void CRynEditDoc::UsePorts(const Ports& outside) {
     CK44SetupDoc::UsePorts(outside);
     globalKvf->Values().UsePorts(outside);
+    if (GetPathName().empty()) // the fonts of an opened document are its file's
+        results.UseMessageFont(outside.platformFont->MessageFont());
 }
 
 int CRynEditDoc::OnNewDocument() {
@@ -46,7 +55,9 @@ int CRynEditDoc::OnOpenDocument(const std::string& path) {
     }
     // Absolute before anything is read, since reading moves the current directory.
     const std::string name = FindParameterFile(FullPath(path));
-    LoadParameters(name, SplitPath(name).directory);
+    const std::string baseDirectory = SplitPath(name).directory;
+    LoadParameters(name, baseDirectory);
+    LoadResults(baseDirectory);
     CDocument::SetPathName(name, 0);
     return 1;
 }
@@ -69,6 +80,19 @@ void CRynEditDoc::LoadParameters(const std::string& path, const std::string& bas
     kvfClose(&tree);
 }
 
+void CRynEditDoc::LoadResults(const std::string& baseDirectory) {
+    results.Clear();
+    kvfClose(&results.HistogramKvf);
+    kvfClose(&results.GraphsKvf);
+    resultError = Status::Ok();
+    const std::string& file = globalKvf->DefineEVS().OutputFileName;
+    if (file.empty())
+        return;
+    resultError = ReadResultFile(results, file, baseDirectory);
+    if (resultError)
+        SetModifiedFlag(0);
+}
+
 int CRynEditDoc::OnSaveDocument(const std::string& path) {
     GetPorts().keyboardFocus->ReleaseFocus();
     const std::string asked = FullPath(path);
@@ -81,20 +105,40 @@ int CRynEditDoc::OnSaveDocument(const std::string& path) {
             brokenFile.clear();
     }
     SetPathName(name, 1);
+    const std::string baseDirectory = CQxPath(name).GetDirectoryName();
     if (ready)
-        WriteFiles(name);
-    else
-        NoteSaveError(ready);
+        ready = WriteParameters(name, baseDirectory);
+    NoteSaveError(std::move(ready));
+    // Whether or not the parameters could be written: a run has emptied the file by now.
+    if (results.IsValid())
+        NoteSaveError(WriteResults(baseDirectory));
     SetModifiedFlag(0);
     return 1;
 }
 
-void CRynEditDoc::WriteFiles(const std::string& path) {
-    const std::string baseDirectory = CQxPath(path).GetDirectoryName();
+Status CRynEditDoc::WriteParameters(const std::string& path, const std::string& baseDirectory) {
     KvfHandle tree = kvfCreate();
     globalKvf->Write(tree.get(), baseDirectory);
-    NoteSaveError(kvfWrite(tree.get(), path, durability));
+    Status written = kvfWrite(tree.get(), path, durability);
     kvfClose(&tree);
+    return written;
+}
+
+Status CRynEditDoc::WriteResults(const std::string& baseDirectory) {
+    if (const Status refused = TestResultFileName(); !refused)
+        return refused;
+    return WriteResultsOfDocument(results, globalKvf->DefineEVS().OutputFileName, baseDirectory,
+                                  durability);
+}
+
+Status CRynEditDoc::TestResultFileName() const {
+    const std::string& result = globalKvf->DefineEVS().OutputFileName;
+    for (const std::string& input :
+         {GetPathName(), globalKvf->DefineEVS().InputFileName,
+          globalKvf->BasicInput().InputFileName, globalKvf->BasicInput().OutputFileName})
+        if (IsSameFile(result, input))
+            return Status::InputFault(FormatText(kTextRunOverInput, result));
+    return Status::Ok();
 }
 
 void CRynEditDoc::NoteSaveError(Status status) {

@@ -15,7 +15,10 @@ class RecordingPorts final : public MessagePort,
                              public KeyboardFocusPort,
                              public RecentFilesPort,
                              public ApplicationPort,
-                             public ProgressPort {
+                             public ProgressPort,
+                             public BusyPort,
+                             public TextViewerPort,
+                             public PlatformFontPort {
   public:
     operator const Ports&() const { return ports; }
 
@@ -23,7 +26,11 @@ class RecordingPorts final : public MessagePort,
     std::vector<std::vector<int>> missingYears;
     std::vector<std::string> questions;
     std::vector<std::string> recentFiles;
+    std::vector<std::string> viewedFiles;
+    FontRecord messageFont;
     int focusReleases = 0;
+    int busy = 0; ///< depth of the sign that stands now
+    int busyRestores = 0;
     Answer answer = Answer::No;
     std::optional<std::string> chosenFile;
 
@@ -41,9 +48,14 @@ class RecordingPorts final : public MessagePort,
     void AddRecentFile(const std::string& path) override { recentFiles.push_back(path); }
     std::string ApplicationName() override { return "Test"; }
     void ShowProgress(long long /*done*/, long long /*total*/) override {}
+    void BeginBusy() override { ++busy; }
+    void RestoreBusy() override { ++busyRestores; }
+    void EndBusy() override { --busy; }
+    void ViewTextFile(const std::string& path) override { viewedFiles.push_back(path); }
+    FontRecord MessageFont() override { return messageFont; }
 
   private:
-    Ports ports{this, this, this, this, this, this, this};
+    Ports ports{this, this, this, this, this, this, this, this, this, this};
 };
 
 } // namespace ryn::test

@@ -34,7 +34,7 @@ ConsolePorts::ConsolePorts(Console& shownOn, Consent answerToQuestions)
     : console(shownOn),
       consent(answerToQuestions),
       progress(shownOn),
-      ports{this, this, this, this, this, this, &progress} {}
+      ports{this, this, this, this, this, this, &progress, this, this, this} {}
 
 void ConsolePorts::Show(MessageKind kind, const std::string& text) {
     progress.Clear();

@@ -36,7 +36,10 @@ class ConsolePorts final : public MessagePort,
                            public FileChoicePort,
                            public KeyboardFocusPort,
                            public RecentFilesPort,
-                           public ApplicationPort {
+                           public ApplicationPort,
+                           public BusyPort,
+                           public TextViewerPort,
+                           public PlatformFontPort {
   public:
     ConsolePorts(Console& shownOn, Consent answerToQuestions);
     ConsolePorts(const ConsolePorts&) = delete;
@@ -55,6 +58,11 @@ class ConsolePorts final : public MessagePort,
     void ReleaseFocus() override {}
     void AddRecentFile(const std::string& /*path*/) override {}
     std::string ApplicationName() override { return "ryn"; }
+    void BeginBusy() override {}
+    void RestoreBusy() override {}
+    void EndBusy() override {}
+    void ViewTextFile(const std::string& /*path*/) override {}
+    FontRecord MessageFont() override { return SilentPorts().platformFont->MessageFont(); }
 
   private:
     Console& console;

@@ -1,0 +1,165 @@
+#include "run/run_command.h"
+
+#include <optional>
+#include <utility>
+
+#include "base/file_access.h"
+#include "base/path_parts.h"
+#include "base/qx_path.h"
+#include "results/result_file.h"
+#include "strings/catalogue.h"
+
+namespace ryn {
+
+namespace {
+
+enum EngineStatus : std::int32_t {
+    kStatusFailed = 1, ///< this series cannot be analysed
+    kStatusFatal = 3,  ///< the set-up cannot be used for any series
+};
+
+bool IsFailure(std::int32_t status) {
+    return status == kStatusFailed || status == kStatusFatal;
+}
+
+/// One run, from the check to the written results.
+class Run {
+  public:
+    Run(CRynEditDoc& analysed, AnalysisEngine used)
+        : document(analysed),
+          engine(used),
+          ports(analysed.GetPorts()),
+          resultFile(analysed.GetGlobalKvf().DefineEVS().OutputFileName),
+          busy(*ports.busy) {}
+
+    RunOutcome Execute();
+
+  private:
+    bool Prepare();
+    bool Save();
+    void CallEngine();
+    void OfferLog();
+    void TakeResults(KvfHandle* output);
+    void End(RunEnd end, Status reason);
+
+    CRynEditDoc& document;
+    AnalysisEngine engine;
+    const Ports& ports;
+    std::string resultFile;
+    BusyScope busy;
+    RunOutcome outcome;
+};
+
+RunOutcome Run::Execute() {
+    if (Prepare() && Save()) {
+        document.Results().Clear();
+        CallEngine();
+    }
+    return std::move(outcome);
+}
+
+void Run::End(RunEnd end, Status reason) {
+    outcome.end = end;
+    outcome.reason = std::move(reason);
+}
+
+/// Nothing has changed where this says no.
+bool Run::Prepare() {
+    if (document.GetGlobalKvf().CheckForRun() != 0) {
+        ports.messages->Show(MessageKind::Error, std::string(Text(kTextRunInputFaults)));
+        End(RunEnd::Findings, Status::Ok());
+        return false;
+    }
+    outcome.logFile = LogFileOf(resultFile);
+    Status writable = document.TestResultFileName();
+    if (writable)
+        writable = EmptyFile(resultFile);
+    if (!writable) {
+        ports.messages->Show(MessageKind::Error, std::string(Text(kTextRunOutputUnwritable)));
+        End(RunEnd::OutputUnwritable, std::move(writable));
+    }
+    return outcome.end == RunEnd::Succeeded;
+}
+
+/// A document that was never saved gets a name; where the user gives none the command goes on, and
+/// finds no file to work from.
+bool Run::Save() {
+    std::string path = document.GetPathName();
+    if (path.empty() || document.GetTitle() == kUntitled) {
+        const std::optional<std::string> chosen = ports.fileChoice->ChooseFileToSave(
+            {"RYN", std::string(Text(kTextParameterFileFilter)), ""});
+        path = chosen.value_or("");
+    }
+    if (!path.empty()) {
+        (void)document.TakeSaveError();
+        document.OnSaveDocument(path);
+        if (Status saved = document.TakeSaveError(); !saved) {
+            document.SetModifiedFlag(1);
+            ports.messages->Show(MessageKind::Error, saved.Text());
+            End(RunEnd::SaveFailed, std::move(saved));
+        }
+    }
+    busy.Restore();
+    return outcome.end == RunEnd::Succeeded;
+}
+
+void Run::CallEngine() {
+    KvfHandle input = kvfLoadFile(document.GetPathName(), 1);
+    std::int32_t status = 0;
+    KvfHandle output;
+    if (kvfPeekErrorGlb() != 0) {
+        kvfGetErrorGlb();
+        std::string reason;
+        kvfGetSyntaxErr(input.get(), nullptr, nullptr, &reason);
+        ports.messages->Show(MessageKind::Error, reason);
+        outcome.reason = Status::InputFault(std::move(reason));
+        busy.Restore();
+        status = kStatusFailed; // nothing valid to hand to the engine
+    } else {
+        output = kvfCreate();
+        busy.Restore();
+        const CurrentDirectoryScope directory(SplitPath(document.GetPathName()).directory);
+        engine(input, output, status);
+    }
+    kvfClose(&input);
+    outcome.engineStatus = status;
+    if (IsFailure(status)) {
+        kvfClose(&output);
+        outcome.end = RunEnd::EngineFailed;
+        OfferLog();
+    } else {
+        TakeResults(&output);
+    }
+}
+
+void Run::OfferLog() {
+    const Answer answer = ports.messages->AskYesNo(std::string(Text(kTextRunFailed)));
+    busy.Restore();
+    if (answer == Answer::Yes)
+        ports.textViewer->ViewTextFile(outcome.logFile);
+}
+
+void Run::TakeResults(KvfHandle* output) {
+    ports.messages->Show(MessageKind::Information, std::string(Text(kTextRunCompleted)));
+    busy.Restore();
+    TakeEngineOutput(output, document.Results());
+    if (Status written = WriteResultsOfRun(document.Results(), resultFile, Durability::Flushed);
+        !written) {
+        ports.messages->Show(MessageKind::Error, written.Text());
+        End(RunEnd::ResultsUnwritten, std::move(written));
+    }
+}
+
+} // namespace
+
+RunOutcome RunAnalysis(CRynEditDoc& document, AnalysisEngine engine) {
+    return Run(document, engine).Execute();
+}
+
+std::string LogFileOf(const std::string& resultFile) {
+    CQxPath path;
+    path.SetFileName(resultFile);
+    return path.GetDirectoryName() + "Ryn.log";
+}
+
+} // namespace ryn
