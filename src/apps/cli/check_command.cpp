@@ -5,6 +5,7 @@
 
 #include "apps/cli/case_file.h"
 #include "apps/cli/command_options.h"
+#include "apps/cli/finding_lines.h"
 #include "apps/cli/json_output.h"
 #include "apps/cli/plain_text.h"
 #include "strings/catalogue.h"
@@ -12,26 +13,6 @@
 namespace ryn::cli {
 
 namespace {
-
-/// A finding's text; one of them ends in a blank, as prescribed for the forms.
-std::string FindingText(const CMessage& finding) {
-    std::string text = PlainLine(finding.text);
-    text.erase(text.find_last_not_of(' ') + 1);
-    return text;
-}
-
-std::string PageTitle(const CRynEditDoc& document, int page) {
-    return document.GetEnumerator()->GetPageTitle(static_cast<std::uint32_t>(page));
-}
-
-void PrintFindings(const CMessageList& findings, CaseFile& file, Console& console) {
-    for (const CMessage& finding : findings)
-        console.out << FormatText(kTextCliFinding, finding.page,
-                                  PageTitle(file.Document(), finding.page), FindingText(finding))
-                    << '\n';
-    if (findings.empty())
-        console.out << FormatText(kTextCliNoFindings, PlainLine(file.ShownName())) << '\n';
-}
 
 Json JsonOfFindings(const CMessageList& findings) {
     Json list = Json::array();
@@ -51,7 +32,9 @@ int RunCheck(const CheckOptions& options, Console& console) {
     if (options.form == OutputForm::Json)
         PrintJson(console, JsonOfFindings(findings));
     else
-        PrintFindings(findings, file, console);
+        PrintFindings(findings, file.Document(), console.out);
+    if (options.form == OutputForm::Text && findings.empty())
+        console.out << FormatText(kTextCliNoFindings, PlainLine(file.ShownName())) << '\n';
     return findings.empty() ? kExitDone : kExitInput;
 }
 

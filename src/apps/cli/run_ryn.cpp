@@ -12,7 +12,9 @@
 #include "apps/cli/import_command.h"
 #include "apps/cli/info_command.h"
 #include "apps/cli/new_command.h"
+#include "apps/cli/run_command.h"
 #include "apps/cli/set_command.h"
+#include "apps/cli/show_command.h"
 #include "base/file_access.h"
 #include "strings/catalogue.h"
 #include "strings/language.h"
@@ -43,6 +45,8 @@ int RunCommand(const std::vector<std::string>& arguments, Console& console) {
     AddSetCommand(line);
     AddCheckCommand(line);
     AddExtractCommand(line);
+    AddRunCommand(line);
+    AddShowCommand(line);
     AddFitCommand(line);
     return line.Run(arguments, console);
 }

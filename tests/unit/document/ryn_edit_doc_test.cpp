@@ -7,6 +7,7 @@
 
 #include "support/recording_ports.h"
 #include "support/temporary_directory.h"
+#include "unit/results/sample_results.h"
 
 namespace ryn {
 namespace {
@@ -229,6 +230,84 @@ TEST(Document, AsksBeforeAModifiedOneIsClosed) {
     EXPECT_NE(opened.document.SaveModified(), 0);
     EXPECT_TRUE(directory.Has("chosen.RYN"));
     EXPECT_THAT(opened.ports.questions.back(), HasSubstr("Untitled"));
+}
+
+TEST(Document, OpensAndSavesTheResultsThatItsParametersName) {
+    const TemporaryDirectory directory;
+    const std::string both = "RynEditor { DefineEVS { OutputFileName = \"a.res\" } }\n";
+    directory.Write("a.RYN", both);
+    directory.Write("a.res", std::string(test::kSampleOutput) + "Histogram { A = 1 }\n");
+    std::string firstSave;
+    for (int round = 0; round < 2; ++round) {
+        Opened opened;
+        opened.document.SetModifiedFlag(1);
+        opened.document.OnOpenDocument(directory.Path("a.RYN"));
+        EXPECT_TRUE(opened.document.Results().IsValid());
+        EXPECT_TRUE(opened.document.ResultError());
+        EXPECT_FALSE(opened.document.IsModified());
+        EXPECT_EQ(test::OutputText(opened.document.Results()), test::kSampleOutput);
+        opened.document.OnSaveDocument(directory.Path("a.RYN"));
+        EXPECT_TRUE(opened.document.TakeSaveError());
+        const std::string saved = directory.Read("a.res");
+        EXPECT_EQ(saved, test::kSampleOutput + test::SettingsText(opened.document.Results()) +
+                             "Histogram {\n    A = 1\n}\n");
+        EXPECT_TRUE(firstSave.empty() || saved == firstSave);
+        firstSave = saved;
+    }
+}
+
+TEST(Document, OpensWithoutResultsInSilence) {
+    const TemporaryDirectory directory;
+    directory.Write("broken.res", std::string(test::kSampleOutput).substr(0, 900));
+    for (const char* result : {"", "none.res", "broken.res", "."}) {
+        directory.Write("a.RYN", std::string("RynEditor { DefineEVS { OutputFileName = \"") +
+                                     result + "\" } }\n");
+        const std::string before = directory.Read("broken.res");
+        Opened opened;
+        EXPECT_NE(opened.document.OnOpenDocument(directory.Path("a.RYN")), 0);
+        EXPECT_FALSE(opened.document.Results().IsValid());
+        EXPECT_THAT(opened.ports.messages, IsEmpty());
+        EXPECT_EQ(opened.document.ResultError().IsOk(), std::string(result).empty());
+        opened.document.OnSaveDocument(directory.Path("a.RYN")); // writes the parameter file alone
+        EXPECT_EQ(directory.Read("broken.res"), before);
+        EXPECT_FALSE(directory.Has("none.res"));
+    }
+}
+
+TEST(Document, ThatIsOpenedAgainDropsTheResultsItHad) {
+    const TemporaryDirectory directory;
+    directory.Write("a.RYN", "RynEditor { DefineEVS { OutputFileName = \"a.res\" } }\n");
+    directory.Write("a.res", std::string(test::kSampleOutput) + "Graphs { A = 1 }\n");
+    directory.Write("b.RYN", "RynEditor { DefineEVS { OutputFileName = \"b.res\" } }\n");
+    Opened opened;
+    opened.document.OnOpenDocument(directory.Path("a.RYN"));
+    opened.document.OnOpenDocument(directory.Path("b.RYN"));
+    EXPECT_FALSE(opened.document.Results().IsValid());
+    EXPECT_EQ(opened.document.Results().GraphsKvf, nullptr);
+}
+
+TEST(Document, NeverWritesResultsOverItsInputs) {
+    const TemporaryDirectory directory;
+    directory.Write("a.RYN", "RynEditor { DefineEVS { OutputFileName = \"a.res\" } }\n");
+    directory.Write("a.res", test::kSampleOutput);
+    Opened opened;
+    opened.document.OnOpenDocument(directory.Path("a.RYN"));
+    opened.document.GetGlobalKvf().DefineEVS().OutputFileName = directory.Path("a.RYN");
+    opened.document.OnSaveDocument(directory.Path("a.RYN"));
+    EXPECT_THAT(opened.document.TakeSaveError().Text(), HasSubstr("a.RYN"));
+    EXPECT_THAT(directory.Read("a.RYN"), HasSubstr("DefineEVS"));
+}
+
+TEST(Document, TellsOfAResultFileThatCannotBeWritten) {
+    const TemporaryDirectory directory;
+    directory.Write("a.RYN", "RynEditor { DefineEVS { OutputFileName = \"a.res\" } }\n");
+    directory.Write("a.res", test::kSampleOutput);
+    Opened opened;
+    opened.document.OnOpenDocument(directory.Path("a.RYN"));
+    opened.document.GetGlobalKvf().DefineEVS().OutputFileName = directory.Path("none/a.res");
+    opened.document.OnSaveDocument(directory.Path("a.RYN"));
+    EXPECT_FALSE(opened.document.IsModified());
+    EXPECT_THAT(opened.document.TakeSaveError().Text(), HasSubstr("none/a.res"));
 }
 
 TEST(Document, IsClosedByItsOwner) {

@@ -1,0 +1,179 @@
+#include "apps/cli/run_command.h"
+
+#include <algorithm>
+#include <cmath>
+#include <memory>
+#include <ostream>
+#include <sstream>
+#include <vector>
+
+#include "apps/cli/case_file.h"
+#include "apps/cli/command_options.h"
+#include "apps/cli/finding_lines.h"
+#include "apps/cli/json_output.h"
+#include "apps/cli/plain_text.h"
+#include "apps/cli/text_table.h"
+#include "base/file_access.h"
+#include "base/number_text.h"
+#include "results/number_rule.h"
+#include "run/run_command.h"
+#include "strings/catalogue.h"
+
+namespace ryn::cli {
+
+namespace {
+
+constexpr std::size_t kLogLinesShown = 20;
+
+/// The last lines of the engine's log, on standard error. The log of a long list of combinations
+/// tells at its end what went wrong.
+void ShowLog(const std::string& path, Console& console) {
+    constexpr std::size_t kLargestLog = 64U << 20U;
+    std::string text;
+    if (!ReadWholeFile(path, kLargestLog, &text)) {
+        ShowError(console, FormatText(kTextCliNoLog, path));
+        return;
+    }
+    std::vector<std::string> lines;
+    std::istringstream stream(text);
+    for (std::string line; std::getline(stream, line);)
+        lines.push_back(PlainLine(line));
+    ShowError(console, FormatText(kTextCliRunFailed, path));
+    const std::size_t first = lines.size() - std::min(lines.size(), kLogLinesShown);
+    for (std::size_t i = first; i < lines.size(); ++i)
+        console.err << "  " << lines[i] << '\n';
+}
+
+/// A row of the table: a name and one cell for each return period.
+void AddValues(TextTable& table, const std::string& name, const DoubleList& values,
+               const COutputSettings& results) {
+    std::vector<std::string> row{name};
+    for (const double value : values)
+        row.push_back(std::isnan(value) ? std::string(Text(kTextCliNotComputed))
+                                        : NumberText(value, results.Quantiles.Precision));
+    table.AddRow(row);
+}
+
+bool IsComputed(const DoubleList& values) {
+    return std::any_of(values.begin(), values.end(), [](double v) { return std::isfinite(v); });
+}
+
+void PrintQuantiles(const COutputSettings& results, std::ostream& out) {
+    std::vector<Alignment> alignments(results.ReturnPeriods.size() + 1, Alignment::Right);
+    alignments.front() = Alignment::Left;
+    TextTable table(alignments);
+    std::vector<std::string> heading{std::string(Text(kTextReturnPeriodYears))};
+    for (const double period : results.ReturnPeriods)
+        heading.push_back(ShortestText(period));
+    table.AddRow(heading);
+    const std::vector<SEQItem>& items = results.Quantiles.Items();
+    for (std::size_t i = 0; i < std::min(items.size(), results.ItemNames.size()); ++i) {
+        AddValues(table, results.ItemNames[i], items[i].TyearEvent, results);
+        if (IsComputed(items[i].StdTyearEvent))
+            AddValues(table, "  " + std::string(Text(kTextStandardDeviation)),
+                      items[i].StdTyearEvent, results);
+    }
+    table.Print(out);
+}
+
+void PrintResults(CaseFile& file, const RunOutcome& outcome, Console& console) {
+    const COutputSettings& results = file.Document().Results();
+    console.out << FormatText(kTextCliRunWritten,
+                              PlainLine(file.Root().DefineEVS().OutputFileName),
+                              results.SampleStats.SampleSize, results.ItemNames.size())
+                << '\n';
+    if (results.ReturnPeriods.empty())
+        ShowNote(console, Text(kTextCliRunNoPeriods));
+    else if (!results.ItemNames.empty())
+        PrintQuantiles(results, console.out);
+    if (outcome.engineStatus != 0)
+        ShowWarning(console, FormatText(kTextCliRunWarnings, outcome.logFile));
+}
+
+Json JsonOfQuantiles(const SEQItem& item, const DoubleList& periods) {
+    Json list = Json::array();
+    const std::size_t count = std::min({periods.size(), item.TyearEvent.size(),
+                                        item.AvgTyearEvent.size(), item.StdTyearEvent.size()});
+    for (std::size_t i = 0; i < count; ++i)
+        list.push_back({{"period", JsonOf(periods[i])},
+                        {"estimate", JsonOf(item.TyearEvent[i])},
+                        {"average", JsonOf(item.AvgTyearEvent[i])},
+                        {"standardDeviation", JsonOf(item.StdTyearEvent[i])}});
+    return list;
+}
+
+Json JsonOfRun(CaseFile& file, const RunOutcome& outcome) {
+    const COutputSettings& results = file.Document().Results();
+    Json combinations = Json::array();
+    const std::vector<SEQItem>& items = results.Quantiles.Items();
+    for (std::size_t i = 0; i < std::min(items.size(), results.ItemNames.size()); ++i)
+        combinations.push_back(
+            {{"name", results.ItemNames[i]},
+             {"quantiles", JsonOfQuantiles(items[i], results.ReturnPeriods)}});
+    return {{"status", outcome.engineStatus},
+            {"resultFile", file.Root().DefineEVS().OutputFileName},
+            {"logFile", outcome.logFile},
+            {"count", results.SampleStats.SampleSize},
+            {"unit", results.Unit},
+            {"combinations", std::move(combinations)}};
+}
+
+/// What stopped the run, as an exit code; its message was shown already.
+int ExitCodeOf(const RunOutcome& outcome) {
+    switch (outcome.end) {
+    case RunEnd::Succeeded:
+        return kExitDone;
+    case RunEnd::Findings:
+        return kExitInput;
+    case RunEnd::OutputUnwritable:
+        return outcome.reason.Kind() == Fault::Input ? kExitInput : kExitSystem;
+    case RunEnd::EngineFailed:
+        return kExitAnalysis;
+    case RunEnd::SaveFailed:
+    case RunEnd::ResultsUnwritten:
+        break;
+    }
+    return kExitSystem;
+}
+
+/// The messages of the command stay general where a window shows the rest; here it is said.
+void ShowDetail(CaseFile& file, const RunOutcome& outcome, Console& console) {
+    if (outcome.end == RunEnd::Findings) {
+        CMessageList findings;
+        file.Root().DefineEVS().Check(findings, 1);
+        file.Root().Analysis().Check(findings, 1);
+        file.Root().Distributions().Check(findings, 1);
+        PrintFindings(findings, file.Document(), console.err);
+    }
+    if (outcome.end == RunEnd::OutputUnwritable)
+        ShowError(console, outcome.reason.Text());
+    if (outcome.end == RunEnd::EngineFailed)
+        ShowLog(outcome.logFile, console);
+}
+
+} // namespace
+
+int RunRun(const RunOptions& options, Console& console) {
+    // The run's one question is whether to show the log, which here is always shown.
+    CaseFile file(console, Consent::Given);
+    if (const int refused = file.Open(options.file))
+        return refused;
+    const RunOutcome outcome = RunAnalysis(file.Document());
+    ShowDetail(file, outcome, console);
+    if (outcome.end == RunEnd::Succeeded && options.form == OutputForm::Json)
+        PrintJson(console, JsonOfRun(file, outcome));
+    else if (outcome.end == RunEnd::Succeeded)
+        PrintResults(file, outcome, console);
+    return ExitCodeOf(outcome);
+}
+
+void AddRunCommand(CommandLine& line) {
+    auto options = std::make_shared<RunOptions>();
+    CLI::App& command = line.Add({"run", kTextCliHelpRun, [options](Console& console) {
+                                      return RunRun(*options, console);
+                                  }});
+    AddCaseFileArgument(command, &options->file);
+    AddJsonOption(command, &options->form);
+}
+
+} // namespace ryn::cli
