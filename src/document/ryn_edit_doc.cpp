@@ -125,7 +125,7 @@ Status CRynEditDoc::WriteParameters(const std::string& path, const std::string& 
 }
 
 Status CRynEditDoc::WriteResults(const std::string& baseDirectory) {
-    if (const Status refused = TestResultFileName(); !refused)
+    if (Status refused = TestResultFileName(); !refused)
         return refused;
     return WriteResultsOfDocument(results, globalKvf->DefineEVS().OutputFileName, baseDirectory,
                                   durability);

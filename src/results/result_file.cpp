@@ -51,7 +51,7 @@ void TakeEngineOutput(KvfHandle* tree, COutputSettings& results) {
 Status WriteResultsOfRun(COutputSettings& results, const std::string& path, Durability durability) {
     KvfHandle output = kvfCreate();
     AddOutput(output.get(), results);
-    const Status written = kvfWrite(output.get(), path, durability);
+    Status written = kvfWrite(output.get(), path, durability);
     kvfClose(&output);
     if (!written)
         return written;
