@@ -7,6 +7,7 @@
 #include "import/date_order.h"
 #include "import/item_columns.h"
 #include "import/spread_columns.h"
+#include "import/stray_rows.h"
 #include "import/table_names.h"
 #include "import/table_shape.h"
 #include "import/table_text.h"
@@ -71,12 +72,12 @@ std::size_t WithFaultyRowsBefore(const TableShape& shape, const TimeLayout& time
                                  std::size_t first) {
     while (first > 0) {
         const HeadRow& row = shape.rows[first - 1];
-        const std::string text = TimeReader(time).TextOf(row.Views());
-        if (row.isComment || row.fields.size() != shape.fieldCount || text.empty() ||
-            !IsDigit(text[0]))
+        if (row.isComment || row.fields.size() != shape.fieldCount)
             break;
+        const std::string text = TimeReader(time).TextOf(row.Views());
         const FieldKind kind = KindOfField(row.fields[time.columns[0].column], shape.decimal);
-        if (kind != FieldKind::Time && kind != FieldKind::Number)
+        const bool startsAsNumber = !text.empty() && IsDigit(text[0]) && kind == FieldKind::Number;
+        if (kind != FieldKind::Time && !startsAsNumber)
             break;
         --first;
     }
@@ -138,13 +139,16 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
     RowRun run = LongestRun(byKind);
     if (run.count == 0)
         return Status::InputFault("no rows with numbers were found");
+    Status status = CheckRowsAbove(shape, run);
+    if (!status)
+        return status;
     FindNames(shape, run.first, layout);
     const SampleRows first(shape, run, layout->columns);
     if (first.Count() == 0) // nothing but numbers with marks
         return Status::InputFault("no rows with numbers were found");
-    Status status = FindTime(first, settings, layout);
+    status = FindTime(first, settings, layout);
     if (!status)
-        return status;
+        return NameRowsWithoutTime(shape, run, settings, *layout, status);
     const TimeLayout& time = layout->time;
     std::vector<RowRun> runs = byKind;
     // By their time alone: a row with a bad value still belongs to the table, and reading names it.

@@ -73,10 +73,29 @@ TEST(TableRefusal, NamesTheLineOfATimeThatIsNone) {
          "give the lines before the one to take with --skip"},
         {WithRow("2001-01-03T00:00Z,3.5,0"),
          "line 2: the time has no offset from UTC, and the one in line 4 has"},
+        {"a,b\n2001-01-01,1\n2001-13-02,2\n2001-01-03,3\n2001-14-03,3\n2001-01-05,3\n",
+         "line 3: \"2001-13-02\" is no time of the form year-month-day (2 rows cannot be read: "
+         "lines 3, 5)"},
+        {"year,q\n1901,3\n1902,4\n19031,5\n", "line 4: \"19031\" is no time of the form year"},
         // A faulty first row is no header.
         {"time,q\n2001-02-30,1\n2001-03-01,2\n2001-03-02,3\n2001-03-03,4\n2001-03-04,5\n",
          "line 2: \"2001-02-30\" is no time of the form year-month-day"},
     });
+}
+
+TEST(TableRefusal, NamesRowsAboveTheTableWhoseTimeIsWrittenOtherwise) {
+    const std::string days = "2001-01-01;5\n2001-01-02;6\n2001-01-03;7\n2001-01-04;5\n";
+    CheckAll({
+        {"date;q\nQ1 1950;300\nQ2 1950;280\n" + days,
+         "line 2: \"Q1 1950\" in column 1 is not written as in the rows from line 4 on, but the "
+         "line looks like one of them (2 such lines, up to 3); write them alike, or leave out what "
+         "is none with --skip 3"},
+        {"year;q\n1961-62;345\n1963;210\n1964;310\n1965;310\n1966;310\n1967;310\n",
+         "line 2: \"1961-62\" in column 1 is not written as in the rows from line 3 on, but the "
+         "line "
+         "looks like one of them; write them alike, or leave out what is none with --skip 2"},
+    });
+    EXPECT_TRUE(Imported("Gauge 12;x\nGauge zero;12.5\nArea in km;300\ndate;q\n" + days).status);
 }
 
 TEST(TableRefusal, CountsTheRowsThatCannotBeRead) {
