@@ -21,8 +21,12 @@ class DecimalWatch {
         : layout(tableLayout),
           isSettled(tableLayout.isDecimalGiven) {}
 
+    /// A number as it is written, without a mark behind it.
     void Look(long line, std::size_t column, std::string_view number) {
-        if (!isSettled)
+        // Most whole numbers tell nothing more; this runs for each value.
+        const bool isKnown =
+            hundreds && number.size() <= 3 && number.find(layout.decimal) == std::string_view::npos;
+        if (!isSettled && !isKnown)
             LookCloser(line, column, number);
     }
     /// A fault that names the first value in doubt.

@@ -213,7 +213,9 @@ void RowParser::TakeRow(const TableRecord& record, const std::vector<std::string
         return;
     }
     CheckOffset(record.line);
-    if (!HasFields(record, fields.size()) || HasDigitsTooMany(record, fields))
+    if (!HasFields(record, fields.size()))
+        return;
+    if (fields.size() > layout.columns.size() && HasDigitsTooMany(record, fields))
         return;
     if (layout.months.empty())
         TakeSample(record.line, moment, fields, layout.items);
