@@ -2,8 +2,11 @@
 
 #include <algorithm>
 #include <array>
+#include <map>
+#include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "base/number_text.h"
 #include "import/table_text.h"
@@ -67,23 +70,31 @@ std::optional<int> PartTitle(std::string_view title, std::string* stem) {
     return ParseInt(title.substr(start));
 }
 
-/// The titles that count on from this column, if it has a 0 or a 1.
-Sequence CountedFrom(const std::vector<std::string>& titles, std::size_t first) {
-    Sequence found{first, first, 0, {}};
+/// The titles that count on from 0 or 1, a sequence for each stem.
+std::vector<Sequence> CountedTitles(const std::vector<std::string>& titles) {
+    struct Counting {
+        Sequence columns;
+        int next = 0;
+    };
+    std::map<std::string, Counting> byStem;
     std::string stem;
-    const std::optional<int> start = PartTitle(titles[first], &found.stem);
-    if (!start || *start > 1)
-        return found;
-    int next = *start;
-    for (std::size_t i = first; i < titles.size(); ++i) {
+    for (std::size_t i = 0; i < titles.size(); ++i) {
         const std::optional<int> number = PartTitle(titles[i], &stem);
-        if (!number || stem != found.stem || *number != next)
+        if (!number || (byStem.count(stem) == 0 && *number > 1))
             continue;
-        ++next;
-        ++found.count;
-        found.last = i;
+        Counting& found =
+            byStem.try_emplace(stem, Counting{{i, i, 0, stem}, *number}).first->second;
+        if (*number != found.next)
+            continue;
+        ++found.next;
+        ++found.columns.count;
+        found.columns.last = i;
     }
-    return found;
+    std::vector<Sequence> sequences;
+    sequences.reserve(byStem.size() + 1);
+    for (const auto& [name, counting] : byStem)
+        sequences.push_back(counting.columns);
+    return sequences;
 }
 
 /// The twelve months by name, in any order: the hydrological year begins in autumn.
@@ -170,11 +181,9 @@ Status CheckSpreadColumns(const TableShape& shape, const TableLayout& layout) {
     const Sequence months = NamedMonths(titles);
     if (months.count == kMonths)
         return fault("month", months);
-    std::vector<Sequence> sequences;
+    std::vector<Sequence> sequences = CountedTitles(titles);
     if (layout.nameLine == 0)
         sequences.push_back(UntitledNumbers(layout));
-    for (std::size_t i = 0; i < titles.size(); ++i)
-        sequences.push_back(CountedFrom(titles, i));
     const RowSpan span = SpanOfRow(layout.time);
     for (const Sequence& columns : sequences) {
         const std::string part = PartOfRow(span, columns);
