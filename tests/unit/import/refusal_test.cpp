@@ -9,7 +9,6 @@
 namespace ryn {
 namespace {
 
-using test::ExpectContains;
 using test::Imported;
 
 struct Refusal {
