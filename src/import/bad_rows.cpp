@@ -8,12 +8,15 @@ void BadRows::Add(long line, const std::string& fault) {
     rows.Add(line);
 }
 
+std::string BadRows::Text() const {
+    if (rows.count <= 1)
+        return first;
+    return first + " (" + std::to_string(rows.count) + " rows cannot be read: lines " +
+           LineList(rows.firstLines, rows.count) + ")";
+}
+
 Status BadRows::AsFault(const std::string& source) const {
-    std::string text = source + ": " + first;
-    if (rows.count > 1)
-        text += " (" + std::to_string(rows.count) + " rows cannot be read: lines " +
-                LineList(rows.firstLines, rows.count) + ")";
-    return Status::InputFault(text);
+    return Status::InputFault(source + ": " + Text());
 }
 
 } // namespace ryn

@@ -13,6 +13,8 @@ class BadRows {
   public:
     void Add(long line, const std::string& fault);
     bool IsEmpty() const { return rows.count == 0; }
+    std::string Text() const;
+    /// The same behind the table's name.
     Status AsFault(const std::string& source) const;
 
   private:

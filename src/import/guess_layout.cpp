@@ -3,8 +3,11 @@
 #include <algorithm>
 #include <string>
 
+#include "import/comma_parts.h"
 #include "import/date_order.h"
 #include "import/item_columns.h"
+#include "import/spread_columns.h"
+#include "import/stray_rows.h"
 #include "import/table_names.h"
 #include "import/table_shape.h"
 #include "import/table_text.h"
@@ -69,12 +72,12 @@ std::size_t WithFaultyRowsBefore(const TableShape& shape, const TimeLayout& time
                                  std::size_t first) {
     while (first > 0) {
         const HeadRow& row = shape.rows[first - 1];
-        const std::string text = TimeReader(time).TextOf(row.Views());
-        if (row.isComment || row.fields.size() != shape.fieldCount || text.empty() ||
-            !IsDigit(text[0]))
+        if (row.isComment || row.fields.size() != shape.fieldCount)
             break;
+        const std::string text = TimeReader(time).TextOf(row.Views());
         const FieldKind kind = KindOfField(row.fields[time.columns[0].column], shape.decimal);
-        if (kind != FieldKind::Time && kind != FieldKind::Number)
+        const bool startsAsNumber = !text.empty() && IsDigit(text[0]) && kind == FieldKind::Number;
+        if (kind != FieldKind::Time && !startsAsNumber)
             break;
         --first;
     }
@@ -122,58 +125,10 @@ void NoteTimeRules(const SampleRows& rows, const ImportSettings& settings, Table
                                       : "months alone: each value is placed at the first day");
 }
 
-/// Commas that may part thousands as well as decimals: every number with one has exactly three
-/// digits behind it, none starts with a zero, and none tells by its other digits.
-bool IsDecimalInDoubt(const SampleRows& rows, const TableLayout& layout) {
-    bool hasComma = false;
-    for (const auto& fields : rows.All()) {
-        for (const std::size_t item : layout.items) {
-            std::string_view field = fields[item];
-            if (!field.empty() && (field[0] == '-' || field[0] == '+'))
-                field.remove_prefix(1);
-            const std::size_t comma = field.find(',');
-            if (comma == std::string_view::npos) {
-                if (field.size() > 3 && IsDigits(field))
-                    return false; // thousands without a comma
-                continue;
-            }
-            hasComma = true;
-            if (field.size() - comma != 4 || field[0] == '0' || comma > 3)
-                return false;
-        }
-    }
-    return hasComma;
-}
-
 void KeepPreview(const SampleRows& rows, TableLayout* layout) {
     constexpr std::size_t kPreviewed = 20;
     for (std::size_t i = 0; i < rows.Count() && i < kPreviewed; ++i)
         layout->preview.emplace_back(rows.All()[i].begin(), rows.All()[i].end());
-}
-
-bool IsWholeNumber(const std::string& field) {
-    const std::size_t start = !field.empty() && (field[0] == '-' || field[0] == '+') ? 1 : 0;
-    return field.size() > start &&
-           field.find_first_not_of("0123456789", start) == std::string::npos;
-}
-
-/// "2001-01-01,10,5" below "Date,Flow": a comma that parts the columns and the decimals too. The
-/// same shape with decimal points in it is a table whose row names are dates.
-bool CommaPartsDecimalsToo(const TableShape& shape, const RowRun& run) {
-    if (shape.delimiter != ',' || run.first == 0 || shape.fieldCount < 3 ||
-        shape.kinds[0] != ColumnKind::Time || shape.kinds[1] != ColumnKind::Number)
-        return false;
-    const HeadRow& header = shape.rows[run.first - 1];
-    if (header.isComment || header.fields.size() + 1 != shape.fieldCount)
-        return false;
-    const std::size_t end = std::min(run.first + run.count, shape.rows.size());
-    for (std::size_t i = run.first; i < end; ++i) {
-        const auto& fields = shape.rows[i].fields;
-        if (fields.size() == shape.fieldCount &&
-            !(IsWholeNumber(fields[1]) && IsWholeNumber(fields[2])))
-            return false;
-    }
-    return true;
 }
 
 /// The names that the rows' kinds alone suggest, which the search for time columns needs; then the
@@ -184,13 +139,16 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
     RowRun run = LongestRun(byKind);
     if (run.count == 0)
         return Status::InputFault("no rows with numbers were found");
+    Status status = CheckRowsAbove(shape, run);
+    if (!status)
+        return status;
     FindNames(shape, run.first, layout);
     const SampleRows first(shape, run, layout->columns);
     if (first.Count() == 0) // nothing but numbers with marks
         return Status::InputFault("no rows with numbers were found");
-    Status status = FindTime(first, settings, layout);
+    status = FindTime(first, settings, layout);
     if (!status)
-        return status;
+        return NameRowsWithoutTime(shape, run, settings, *layout, status);
     const TimeLayout& time = layout->time;
     std::vector<RowRun> runs = byKind;
     // By their time alone: a row with a bad value still belongs to the table, and reading names it.
@@ -205,11 +163,6 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
         run.first = WithFaultyRowsBefore(shape, time, run.first);
     // Again, since the rows may start elsewhere than the kinds of their fields suggested.
     FindNames(shape, run.first, layout);
-    if (!settings.decimal && CommaPartsDecimalsToo(shape, run))
-        return Status::InputFault("line " + std::to_string(shape.rows[run.first].line) +
-                                  " has a field more than the names above it: a decimal comma may "
-                                  "part its numbers; write decimal points, or say --decimal . if "
-                                  "they are whole numbers");
     ReadPreamble(shape, run.first, layout);
     layout->dataLine = shape.rows[run.first].line;
     const SampleRows rows(shape, run, layout->columns);
@@ -218,10 +171,10 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
     status = ChooseItems(rows, settings, layout);
     NoteTimeRules(rows, settings, layout);
     KeepPreview(rows, layout);
-    if (status && layout->decimal == ',' && !settings.decimal && IsDecimalInDoubt(rows, *layout))
-        return Status::InputFault("the commas in column " + ColumnTitle(*layout, layout->items[0]) +
-                                  " may part decimals or thousands; if they are decimal commas say "
-                                  "so with --decimal , (thousands separators are not read)");
+    if (status && settings.itemColumns.empty())
+        status = CheckSpreadColumns(shape, *layout);
+    if (status && !settings.decimal)
+        status = CheckCommaPartsColumns(shape, run, settings, *layout);
     return status;
 }
 
@@ -239,6 +192,7 @@ Status GuessFromHead(const TableHead& head, const ImportSettings& settings, Tabl
     guessed.encoding = head.encoding;
     guessed.delimiter = shape->delimiter;
     guessed.decimal = shape->decimal;
+    guessed.isDecimalGiven = settings.decimal.has_value();
     guessed.commentMarks = shape->commentMarks;
     Status status = LayOut(*shape, settings, &guessed);
     if (status)

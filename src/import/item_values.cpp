@@ -29,6 +29,7 @@ ItemValues::ItemValues(const TableLayout& tableLayout, const MissingRules& missi
       missing(missingRules),
       report(importReport),
       bad(badRows),
+      decimals(tableLayout),
       emptyIsGiven(std::find(missing.texts.begin(), missing.texts.end(), "") !=
                    missing.texts.end()) {}
 
@@ -95,6 +96,9 @@ ValueResult ItemValues::Read(long line, std::size_t column, std::string_view fie
         CountText(number.mark, &report->marks);
     else if (number.kind != NumberKind::Value)
         return Refuse(line, column, field, number.kind);
+    decimals.Look(
+        line, column,
+        number.mark.empty() ? field : Trimmed(field.substr(0, field.size() - number.mark.size())));
     *value = number.value;
     return ValueResult::Taken;
 }

@@ -3,6 +3,7 @@
 #include <string_view>
 
 #include "import/bad_rows.h"
+#include "import/decimal_watch.h"
 #include "import/import_options.h"
 #include "import/import_report.h"
 #include "import/number_field.h"
@@ -26,6 +27,8 @@ class ItemValues {
     /// that ends too early and a blank line are as well.
     bool IsEmptyGiven() const { return emptyIsGiven; }
     ValueResult CountMissing(std::string_view text);
+    /// A fault where the values read leave open what their decimal sign is.
+    Status DecimalVerdict() const { return decimals.Verdict(); }
 
   private:
     bool IsGiven(const NumberField& number, std::string_view field) const;
@@ -36,6 +39,7 @@ class ItemValues {
     const MissingRules& missing;
     ImportReport* report;
     BadRows* bad;
+    DecimalWatch decimals;
     bool emptyIsGiven;
 };
 

@@ -4,6 +4,8 @@
 #include <optional>
 
 #include "import/bad_rows.h"
+#include "import/comma_parts.h"
+#include "import/field_split.h"
 #include "import/item_values.h"
 #include "import/number_field.h"
 #include "import/record_reader.h"
@@ -40,6 +42,7 @@ class RowParser {
     void TakeRowWithoutTime(const TableRecord& record, const std::vector<std::string_view>& fields);
     bool IsHeaderAgain(const std::vector<std::string_view>& fields) const;
     bool HasFields(const TableRecord& record, std::size_t count);
+    bool HasDigitsTooMany(const TableRecord& record, const std::vector<std::string_view>& fields);
     void TakeSample(long line, Millis moment, const std::vector<std::string_view>& fields,
                     const std::vector<std::size_t>& columns);
     void CheckOffset(long line);
@@ -165,6 +168,30 @@ bool RowParser::HasFields(const TableRecord& record, std::size_t count) {
     return true;
 }
 
+/// A field too many, and whole numbers in the item's and the next one: between commas "10,5" may be
+/// one number, and between blanks "1 234". The value read would be the first part alone.
+bool RowParser::HasDigitsTooMany(const TableRecord& record,
+                                 const std::vector<std::string_view>& fields) {
+    std::size_t count = fields.size();
+    while (count > layout.columns.size() && fields[count - 1].empty())
+        --count;
+    if (layout.isDecimalGiven || count <= layout.columns.size() || !IsDigits(fields[count - 1]))
+        return false;
+    for (const std::size_t item : layout.items) {
+        if (!IsWholeNumber(fields[item]) || !IsDigits(fields[item + 1]))
+            continue;
+        bad.Add(record.line, "has " + std::to_string(count) + " fields where the table has " +
+                                 std::to_string(layout.columns.size()) + ": " +
+                                 Quoted(std::string(fields[item]) + layout.delimiter +
+                                        std::string(fields[item + 1])) +
+                                 " may be one number; write it without the " +
+                                 DelimiterName(layout.delimiter) + ", or say --decimal " +
+                                 layout.decimal + " if it is two");
+        return true;
+    }
+    return false;
+}
+
 void RowParser::CheckOffset(long line) {
     std::optional<long>& first = time.HadOffset() ? firstWithOffset : firstWithoutOffset;
     if (!first)
@@ -187,6 +214,8 @@ void RowParser::TakeRow(const TableRecord& record, const std::vector<std::string
     }
     CheckOffset(record.line);
     if (!HasFields(record, fields.size()))
+        return;
+    if (fields.size() > layout.columns.size() && HasDigitsTooMany(record, fields))
         return;
     if (layout.months.empty())
         TakeSample(record.line, moment, fields, layout.items);
@@ -217,6 +246,9 @@ void RowParser::TakeSample(long line, Millis moment, const std::vector<std::stri
 Status RowParser::Finish(const std::string& source) {
     if (!bad.IsEmpty())
         return bad.AsFault(source);
+    const Status verdict = values.DecimalVerdict();
+    if (!verdict)
+        return Status::InputFault(source + ": " + verdict.Text());
     if (pendingText.count > 0)
         for (const long line : pendingText.firstLines)
             report->Dropped(DropReason::Footer).Add(line);

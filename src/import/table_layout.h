@@ -79,6 +79,7 @@ struct TableLayout {
     TextEncoding encoding = TextEncoding::Utf8;
     char delimiter = ',';
     char decimal = '.';
+    bool isDecimalGiven = false; ///< by the user: it is not doubted
     std::vector<std::string> commentMarks;
     long nameLine = 0; ///< 0 where there is none
     long unitLine = 0;

@@ -9,7 +9,6 @@
 namespace ryn {
 namespace {
 
-using test::ExpectContains;
 using test::Imported;
 
 struct Refusal {
@@ -73,10 +72,29 @@ TEST(TableRefusal, NamesTheLineOfATimeThatIsNone) {
          "give the lines before the one to take with --skip"},
         {WithRow("2001-01-03T00:00Z,3.5,0"),
          "line 2: the time has no offset from UTC, and the one in line 4 has"},
+        {"a,b\n2001-01-01,1\n2001-13-02,2\n2001-01-03,3\n2001-14-03,3\n2001-01-05,3\n",
+         "line 3: \"2001-13-02\" is no time of the form year-month-day (2 rows cannot be read: "
+         "lines 3, 5)"},
+        {"year,q\n1901,3\n1902,4\n19031,5\n", "line 4: \"19031\" is no time of the form year"},
         // A faulty first row is no header.
         {"time,q\n2001-02-30,1\n2001-03-01,2\n2001-03-02,3\n2001-03-03,4\n2001-03-04,5\n",
          "line 2: \"2001-02-30\" is no time of the form year-month-day"},
     });
+}
+
+TEST(TableRefusal, NamesRowsAboveTheTableWhoseTimeIsWrittenOtherwise) {
+    const std::string days = "2001-01-01;5\n2001-01-02;6\n2001-01-03;7\n2001-01-04;5\n";
+    CheckAll({
+        {"date;q\nQ1 1950;300\nQ2 1950;280\n" + days,
+         "line 2: \"Q1 1950\" in column 1 is not written as in the rows from line 4 on, but the "
+         "line looks like one of them (2 such lines, up to 3); write them alike, or leave out what "
+         "is none with --skip 3"},
+        {"year;q\n1961-62;345\n1963;210\n1964;310\n1965;310\n1966;310\n1967;310\n",
+         "line 2: \"1961-62\" in column 1 is not written as in the rows from line 3 on, but the "
+         "line "
+         "looks like one of them; write them alike, or leave out what is none with --skip 2"},
+    });
+    EXPECT_TRUE(Imported("Gauge 12;x\nGauge zero;12.5\nArea in km;300\ndate;q\n" + days).status);
 }
 
 TEST(TableRefusal, CountsTheRowsThatCannotBeRead) {
@@ -102,9 +120,18 @@ TEST(TableRefusal, SaysWhatToGiveWhereTheTableLeavesItOpen) {
          "the dates may be day-month-year or month-day-year, and no row decides; tell which with "
          "--time-format, such as %d/%m/%Y or %m/%d/%Y"},
         {"d;v\n2001-01-01;147,000\n2001-01-02;152,500\n2001-01-03;160,250\n",
-         "the commas in column 2 \"v\" may part decimals or thousands; if they are decimal commas "
-         "say so with --decimal , (thousands separators are not read)"},
+         "line 2: the comma in \"147,000\", column 2 \"v\", may part decimals or thousands; if it "
+         "is "
+         "a decimal comma say so with --decimal , (thousands separators are not read)"},
+        {"d;v\n2001-01-01;377\n2001-01-02;754 e\n2001-01-03;1.131 e\n2001-01-04;1.224\n",
+         "line 4: the point in \"1.131\", column 2 \"v\", may part decimals or thousands (line 2 "
+         "has "
+         "\"377\" without one); if it is a decimal point say so with --decimal . (thousands "
+         "separators are not read)"},
         {"date,q\n2001-01-01,10,0\n2001-01-02,11,7\n2001-01-03,12,4\n",
+         "line 2 has a field more than the names above it: a decimal comma may part its numbers; "
+         "write decimal points, or say --decimal . if they are whole numbers"},
+        {"year,q\n1901,10,05\n1902,11,71\n1903,12,43\n",
          "line 2 has a field more than the names above it: a decimal comma may part its numbers; "
          "write decimal points, or say --decimal . if they are whole numbers"},
         {"start;end;comment\n2001-01-01;2001-02-01;\n2002-01-01;2002-02-01;\n",
@@ -119,6 +146,78 @@ TEST(TableRefusal, SaysWhatToGiveWhereTheTableLeavesItOpen) {
              return options;
          }()},
     });
+}
+
+/// Rows of the same number under so many titles.
+std::string Wide(const std::string& titles, const std::vector<std::string>& times, int columns) {
+    std::string text = titles;
+    for (const std::string& time : times) {
+        text += time;
+        for (int i = 0; i < columns; ++i)
+            text += "," + std::to_string(i) + ".5";
+        text += "\n";
+    }
+    return text;
+}
+
+TEST(TableRefusal, RefusesOneColumnForEachDayMonthOrHour) {
+    const auto counted = [](std::string titles, const std::string& stem, int count) {
+        for (int i = 1; i <= count; ++i)
+            titles += "," + stem + std::to_string(i);
+        return titles + "\n";
+    };
+    const auto reason = [](const std::string& part, const std::string& columns) {
+        return "line 1: the table has one column for each " + part + ", " + columns +
+               "; bring it into one row for each " + part +
+               " first, or take one of the columns with --item";
+    };
+    CheckAll({
+        {Wide(counted("year,month", "d", 31), {"1961,1", "1961,2", "1961,3"}, 31),
+         reason("day", "\"d1\" to \"d31\"")},
+        {Wide(counted("month", "", 31), {"1961-01", "1961-02", "1961-03"}, 31),
+         reason("day", "\"1\" to \"31\"")},
+        {Wide(counted("year", "", 12), {"1961", "1962", "1963", "1964", "1965"}, 12),
+         reason("month", "\"1\" to \"12\"")},
+        {Wide("year,Oct,Nov,Dec,Jan,Feb,Mar,Apr,May,Jun,Jul,Aug,Sep\n", {"1961", "1962", "1963"},
+              12),
+         reason("month", "\"Oct\" to \"Sep\"")},
+        {Wide("", {"1961", "1962", "1963"}, 12), reason("month", "2 to 13")},
+        {Wide(counted("date", "h", 24), {"1961-01-01", "1961-01-02"}, 24),
+         reason("hour", "\"h1\" to \"h24\"")},
+    });
+    ImportOptions first;
+    first.itemColumns = {"d1"};
+    EXPECT_EQ(
+        Imported(Wide(counted("year,month", "d", 31), {"1961,1", "1961,2"}, 31), first).Days(),
+        "1961-01-01 0.5; 1961-02-01 0.5");
+    // As many columns of another kind: a date has no thirty-one days.
+    EXPECT_TRUE(Imported(Wide(counted("date", "d", 31), {"1961-01-01", "1961-01-02"}, 31)).status);
+}
+
+TEST(TableRefusal, RefusesACommaThatMayPartTheDecimals) {
+    const auto pair = [](const std::string& text, const std::string& columns) {
+        return "line 1: \"" + text + "\" may be one number with a decimal comma, or columns " +
+               columns + "; write decimal points, or name the column with --item if they are two";
+    };
+    CheckAll({
+        {"1961-01-01,3,45\n1961-01-02,2,05\n1961-01-03,12,10\n", pair("3,45", "2 and 3")},
+        {"1961,3,4\n1962,2,0\n1963,12,1\n", pair("3,4", "2 and 3")},
+        {"1961-01-01,3,45\n1961-01-02,2\n1961-01-03,2,5\n1961-01-04,12,125\n1961-01-05,4\n",
+         pair("3,45", "2 and 3")},
+        // A whole part that never changes looks like a label.
+        {"1961-01-01,1,45\n1961-01-02,1,05\n1961-01-03,1,10\n1961-01-04,1,31\n",
+         pair("1,45", "2 and 3")},
+        {"date,q\n1961-01-01,3\n1961-01-02,2\n1961-01-03,3,5\n1961-01-04,3\n1961-01-05,3\n",
+         "line 4: has 3 fields where the table has 2: \"3,5\" may be one number; write it without "
+         "the comma, or say --decimal . if it is two"},
+        {"date q\n1961-01-01 3\n1961-01-02 2\n1961-01-03 1 234\n1961-01-04 3\n1961-01-05 3\n",
+         "line 4: has 3 fields where the table has 2: \"1 234\" may be one number; write it "
+         "without the blanks, or say --decimal . if it is two"},
+    });
+    ImportOptions second;
+    second.itemColumns = {"3"};
+    EXPECT_EQ(Imported("1961-01-01,3,45\n1961-01-02,2,12\n", second).Days(),
+              "1961-01-01 45; 1961-01-02 12");
 }
 
 TEST(TableRefusal, RefusesThousandsSeparatorsRatherThanMisreadThem) {
