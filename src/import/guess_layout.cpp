@@ -107,7 +107,8 @@ bool HasTwoDigitYears(const SampleRows& rows, const TimeLayout& time) {
 /// Rules that place values at moments which the table does not write; the user has to know them.
 void NoteTimeRules(const SampleRows& rows, const ImportSettings& settings, TableLayout* layout) {
     const TimeLayout& time = layout->time;
-    if (HasTwoDigitYears(rows, time) || (time.pattern && time.pattern->Has("y")))
+    if (HasTwoDigitYears(rows, time) ||
+        (time.pattern && time.pattern->Has("y") && !time.pattern->Has("Y")))
         layout->notes.emplace_back(
             "two-digit years: 30 to 99 are 1930 to 1999, 00 to 29 are 2000 to 2029");
     const bool isDate = !time.columns.empty() && time.columns[0].role == TimeRole::Date;

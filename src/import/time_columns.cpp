@@ -107,6 +107,24 @@ Status NoTime(PartsResult parts, const ImportSettings& settings, const TableLayo
                               " does not read as time; tell its form with --time-format");
 }
 
+/// "1999/00" names the year that begins in 1999, at a day that the table does not tell.
+Status RefuseHydrologicalYears(const SampleRows& rows, std::size_t column,
+                               const TableLayout& layout) {
+    std::size_t row = 0;
+    while (!IsHydrologicalYear(rows.All()[row][column]))
+        ++row;
+    constexpr std::size_t kYearSize = 4;
+    const std::string_view first = rows.All()[row][column];
+    const std::string format = "%Y" + std::string(first.substr(kYearSize, 1)) +
+                               (first.size() > 2 * kYearSize ? "%Y" : "%y");
+    return Status::InputFault(
+        "line " + std::to_string(rows.LineOf(row)) + ": " + Quoted(first) +
+        " and the like in column " + ColumnTitle(layout, column) +
+        " are hydrological years, not months; take the year in which each begins with "
+        "--time-format " +
+        format + " (and its first day with --start, such as 1999-10-01)");
+}
+
 /// The axis of --start and --step; columns with times are told, and are no items.
 void UseStep(const ImportSettings& settings, TableLayout* layout) {
     TimeLayout& time = layout->time;
@@ -162,6 +180,10 @@ Status Search(const SampleRows& rows, const ImportSettings& settings,
         UseStep(settings, layout);
         return Status::Ok();
     }
+    const std::optional<std::size_t> hydrological =
+        isFound ? std::nullopt : FindHydrologicalYears(search);
+    if (hydrological)
+        return RefuseHydrologicalYears(rows, *hydrological, *layout);
     if (!isFound)
         return NoTime(parts, settings, *layout);
     UseStart(settings, layout);

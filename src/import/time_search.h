@@ -1,6 +1,7 @@
 #pragma once
 
 #include <algorithm>
+#include <optional>
 #include <vector>
 
 #include "import/sample_rows.h"
@@ -61,6 +62,11 @@ PartsResult FindPartColumns(const TimeSearch& search, TimeLayout* time);
 
 /// Year, month and day (and hour, minute, second) side by side without names, told by their values.
 bool FindUnnamedParts(const TimeSearch& search, TimeLayout* time);
+
+/// "1999/00", "1999-2000": a year and the one after it.
+bool IsHydrologicalYear(std::string_view field);
+/// The first column of years such as "1999/00", which are no months; several rows have to tell.
+std::optional<std::size_t> FindHydrologicalYears(const TimeSearch& search);
 
 /// A column of months, years, decimal years, or lengths of time.
 bool FindOtherTime(const TimeSearch& search, TimeLayout* time);

@@ -101,6 +101,14 @@ TEST(TableRefusal, SaysWhatToGiveWhereTheTableLeavesItOpen) {
         {"d,v\n1/2/2001,1\n3/4/2001,2\n",
          "the dates may be day-month-year or month-day-year, and no row decides; tell which with "
          "--time-format, such as %d/%m/%Y or %m/%d/%Y"},
+        {"year,v\n1999/00,5\n2000/01,6\n2001/02,7\n",
+         "line 2: \"1999/00\" and the like in column 1 \"year\" are hydrological years, not "
+         "months; take the year in which each begins with --time-format %Y/%y (and its first day "
+         "with --start, such as 1999-10-01)"},
+        {"NA;4\n1960-1961;5\n1961-1962;6\n",
+         "line 2: \"1960-1961\" and the like in column 1 are hydrological years, not months; take "
+         "the year in which each begins with --time-format %Y-%Y (and its first day with --start, "
+         "such as 1999-10-01)"},
         {"d;v\n2001-01-01;147,000\n2001-01-02;152,500\n2001-01-03;160,250\n",
          "the commas in column 2 \"v\" may part decimals or thousands; if they are decimal commas "
          "say so with --decimal , (thousands separators are not read)"},
