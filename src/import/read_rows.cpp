@@ -4,6 +4,7 @@
 #include <optional>
 
 #include "import/bad_rows.h"
+#include "import/group_columns.h"
 #include "import/item_values.h"
 #include "import/number_field.h"
 #include "import/record_reader.h"
@@ -24,6 +25,7 @@ class RowParser {
           report(importReport),
           values(tableLayout, missingRules, importReport, &bad),
           time(tableLayout.time),
+          groups(tableLayout),
           row(tableLayout.items.size()) {
         samples->values.resize(layout.items.size());
         samples->isRelative = layout.time.isRelative;
@@ -51,6 +53,7 @@ class RowParser {
     BadRows bad;
     ItemValues values;
     TimeReader time;
+    GroupColumns groups;
     std::vector<float> row;
     std::int64_t steps = 0;  // rows before this one, for an axis of start and step
     DroppedRows pendingText; // lines of text, which are a footer when no row follows
@@ -188,11 +191,14 @@ void RowParser::TakeRow(const TableRecord& record, const std::vector<std::string
     CheckOffset(record.line);
     if (!HasFields(record, fields.size()))
         return;
+    const std::size_t before = samples->Count();
     if (layout.months.empty())
         TakeSample(record.line, moment, fields, layout.items);
     for (std::size_t month = 0; month < layout.months.size(); ++month)
         TakeSample(record.line, *Advance(moment, {static_cast<int>(month), 0}, month > 0 ? 1 : 0),
                    fields, {layout.months[month]});
+    if (samples->Count() > before)
+        groups.Add(record.line, moment, fields);
 }
 
 void RowParser::TakeSample(long line, Millis moment, const std::vector<std::string_view>& fields,
@@ -217,6 +223,8 @@ void RowParser::TakeSample(long line, Millis moment, const std::vector<std::stri
 Status RowParser::Finish(const std::string& source) {
     if (!bad.IsEmpty())
         return bad.AsFault(source);
+    if (Status status = groups.Check(source); !status)
+        return status;
     if (pendingText.count > 0)
         for (const long line : pendingText.firstLines)
             report->Dropped(DropReason::Footer).Add(line);

@@ -152,6 +152,43 @@ TEST(TableRefusal, TellsStepsThatDoNotRise) {
     });
 }
 
+TEST(TableRefusal, RefusesSeveralSeriesInOneTable) {
+    const std::string rest = "; write a table for each (or take the column out where all are one "
+                             "series)";
+    ImportOptions sorted;
+    sorted.sort = true;
+    sorted.duplicates = "max";
+    CheckAll({
+        {"station,date,q\nA,2001-01-01,1\nA,2001-01-02,2\nB,2002-01-01,3\nB,2002-01-02,4\n",
+         "line 4: \"B\" in column 1 \"station\" is another series than \"A\" in line 2" + rest},
+        {"Datum;Messgr\xC3\xB6\xC3\x9F"
+         "e;Wert\n1.1.2001 00:00;W;1\n1.1.2001 01:00;Q;2\n1.1.2001 02:00;W;3\n"
+         "1.1.2001 03:00;T;4\n13.1.2001 00:00;Q;2\n",
+         "line 3: \"Q\" in column 2 \"Messgr\xC3\xB6\xC3\x9F"
+         "e\" is another series than \"W\" in line 2 (3 in all)" +
+             rest},
+        {"\xE8\xA6\xB3\xE6\xB8\xAC\xE6\x89\x80,d,q\nx,2001-01-01,1\n,2001-01-02,2\n"
+         "y,2002-01-01,3\n,2002-01-02,4\n",
+         "line 4: \"y\" in column 1 \"\xE8\xA6\xB3\xE6\xB8\xAC\xE6\x89\x80\" is another "
+         "series than \"x\" in line 2" +
+             rest},
+        {"site_no,d,q\n11,2001-01-01,1\n11,2001-01-02,2\n12,2001-01-01,3\n12,2001-01-03,4\n",
+         "line 4: \"12\" in column 1 \"site_no\" is another series than \"11\" in line 2" + rest,
+         sorted},
+        {"Rees;2001-01-01;1.5\nRees;2001-01-02;2\nEmmerich;2001-02-01;3\nEmmerich;2001-02-02;4\n",
+         "line 3: \"Emmerich\" in column 1 is another series than \"Rees\" in line 1" + rest},
+    });
+    // Flags, constant names, row numbers and measurements of a place are no names of series.
+    for (const char* rows :
+         {"station,d,q,flag\nA,2001-01-01,1,e\nA,2001-01-02,2,e\nA,2001-01-03,3,g\n",
+          "d,q,quality code\n2001-01-01,1,10\n2001-01-02,2,10\n2001-01-03,3,20\n",
+          "2001-01-01,1,provisional\n2001-01-02,2,provisional\n2001-01-03,3,final\n",
+          "d,q,station pressure\n2001-01-01,1,10\n2001-01-02,2,10\n2001-01-03,3,11\n",
+          "id,d,q\nx1,2001-01-01,1\nx2,2001-01-02,2\nx3,2001-01-03,3\n",
+          "Mo,2001-01-01,1\nDi,2001-01-02,2\nMo,2001-01-03,3\n"})
+        EXPECT_EQ(Imported(rows).Days(), "2001-01-01 1; 2001-01-02 2; 2001-01-03 3") << rows;
+}
+
 TEST(TableRefusal, RefusesTwoTablesInOneFile) {
     std::string text = "t,v\n";
     for (int day = 10; day < 22; ++day)
