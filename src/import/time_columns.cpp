@@ -168,6 +168,7 @@ Status Search(const SampleRows& rows, const ImportSettings& settings,
                             settings.start.has_value()};
     PartsResult parts = PartsResult::None;
     bool isFound = FindDateColumn(search, &layout->time);
+    const bool isDate = isFound;
     if (!isFound) {
         parts = FindPartColumns(search, &layout->time);
         isFound = parts == PartsResult::Found ||
@@ -175,6 +176,9 @@ Status Search(const SampleRows& rows, const ImportSettings& settings,
     }
     if (!isFound)
         layout->time = {};
+    const Status clock = FindClockColumn(search, layout);
+    if (isDate)
+        FindZoneColumn(search, &layout->time);
     // The user's own axis goes before the table's times; these are still known not to be items.
     if (settings.step) {
         UseStep(settings, layout);
@@ -186,6 +190,8 @@ Status Search(const SampleRows& rows, const ImportSettings& settings,
         return RefuseHydrologicalYears(rows, *hydrological, *layout);
     if (!isFound)
         return NoTime(parts, settings, *layout);
+    if (!clock)
+        return clock;
     UseStart(settings, layout);
     if (LacksMonth(layout->time))
         layout->notes.emplace_back("the month is that of --start: no column gives it");

@@ -4,6 +4,7 @@
 #include <optional>
 #include <vector>
 
+#include "base/status.h"
 #include "import/sample_rows.h"
 #include "import/table_layout.h"
 
@@ -46,9 +47,15 @@ struct TimeSearch {
     bool IsUsable(std::size_t column, TimeRole role) const;
 };
 
-/// A column of whole dates (and clock times), with the column of clock times and that of zone names
-/// that go with it. False when there is none.
+/// A column of whole dates (and clock times). False when there is none.
 bool FindDateColumn(const TimeSearch& search, TimeLayout* time);
+
+/// The column of times of day that goes with the dates of the layout, where these have none; notes
+/// one that is empty too often. A fault for one that cannot be read.
+Status FindClockColumn(const TimeSearch& search, TableLayout* layout);
+
+/// A column of zone names ("EST", "EDT") beside the time.
+void FindZoneColumn(const TimeSearch& search, TimeLayout* time);
 
 /// What FindPartColumns came to.
 enum class PartsResult {

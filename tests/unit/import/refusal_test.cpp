@@ -73,6 +73,16 @@ TEST(TableRefusal, NamesTheLineOfATimeThatIsNone) {
          "give the lines before the one to take with --skip"},
         {WithRow("2001-01-03T00:00Z,3.5,0"),
          "line 2: the time has no offset from UTC, and the one in line 4 has"},
+        // One fault does not drop the times of day.
+        {"d,clock,q\n2001-01-01,12:30,1\n2001-01-01,24:30,2\n2001-01-02,13:30,3\n",
+         "line 3: \"2001-01-01 24:30\" is no time of the form year-month-day"},
+        {"d,Uhrzeit,q\n2001-01-01,noon,1\n2001-01-02,dusk,2\n",
+         "line 2: \"noon\" in column 2 \"Uhrzeit\" is no time of day; tell its form with --time "
+         "and "
+         "--time-format, or leave the times of day out by naming the date alone with --time"},
+        {"d,time,q\n2001-01-01,0.25,1\n2001-01-01,0.75,2\n",
+         "line 2: \"0.25\" in column 2 \"time\" is no time of day; tell its form with --time and "
+         "--time-format, or leave the times of day out by naming the date alone with --time"},
         // A faulty first row is no header.
         {"time,q\n2001-02-30,1\n2001-03-01,2\n2001-03-02,3\n2001-03-03,4\n2001-03-04,5\n",
          "line 2: \"2001-02-30\" is no time of the form year-month-day"},
