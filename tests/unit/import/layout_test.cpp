@@ -299,7 +299,7 @@ TEST(TableLayout, KnowsManyWaysToWriteATime) {
     });
 }
 
-TEST(TableLayout, ReadsUtf16AsSpreadsheetsExportIt) {
+TEST(TableLayout, ReadsUtf16AndJapaneseEncodings) {
     const std::string ascii = "Zeit\tWert\r\n2001-01-01\t1,5\r\n2001-01-02\t2,5\r\n";
     std::string little = "\xFF\xFE";
     std::string bigWithoutMark;
@@ -312,6 +312,22 @@ TEST(TableLayout, ReadsUtf16AsSpreadsheetsExportIt) {
     EXPECT_EQ(Imported(little).Days(), "2001-01-01 1.5; 2001-01-02 2.5");
     EXPECT_EQ(Imported(bigWithoutMark).Days(), "2001-01-01 1.5; 2001-01-02 2.5");
     ExpectContains(Imported(little).Report(), "UTF-16LE");
+    // Shift_JIS, in which a character may end with a bar.
+    const Imported japanese("\x94N\x8C\x8E\x93\xFA|\x90\x85\x88\xCA(m)|\x94\xF5\x8Dl\n"
+                            "2001/01/30|1.5|\x83|\n"
+                            "2001/01/31|2|\x83\\\n");
+    EXPECT_EQ(japanese.Days(), "2001-01-30 1.5; 2001-01-31 2");
+    for (const char* part : {"Shift_JIS, 3 columns parted by bar", "item: \"水位\"", "unit m"})
+        ExpectContains(japanese.Report(), part);
+    ImportOptions options;
+    options.encoding = "EUC-JP";
+    EXPECT_EQ(Imported("\xC6\xFC,\xBF\xE5\xB0\xCC\n"
+                       "2001-01-30,5\n"
+                       "2001-01-31,6\n",
+                       options)
+                  .report.items[0]
+                  .name,
+              "水位");
 }
 
 TEST(TableLayout, ReadsQuotedFieldsWithDelimitersQuotesAndLineBreaks) {

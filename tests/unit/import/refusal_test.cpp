@@ -315,7 +315,8 @@ TEST(ImportOption, IsRefusedWithWhatItMayBe) {
          "tab, bar, blank"},
         {&ImportOptions::decimal, ";", "--decimal \";\": \".\" or \",\""},
         {&ImportOptions::encoding, "ebcdic",
-         "--encoding \"ebcdic\": utf-8, latin-1, windows-1252, utf-16le or utf-16be"},
+         "--encoding \"ebcdic\": utf-8, latin-1, windows-1252, utf-16le, utf-16be, shift_jis or "
+         "euc-jp"},
         {&ImportOptions::start, "yesterday",
          "--start \"yesterday\": a date such as 1914-01-01 or \"1914-01-01 06:00\""},
         {&ImportOptions::step, "1d", "--step needs --start: the date of the first row"},
