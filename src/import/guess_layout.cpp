@@ -4,6 +4,7 @@
 #include <string>
 
 #include "import/date_order.h"
+#include "import/hash_fields.h"
 #include "import/item_columns.h"
 #include "import/table_names.h"
 #include "import/table_shape.h"
@@ -70,11 +71,13 @@ std::size_t WithFaultyRowsBefore(const TableShape& shape, const TimeLayout& time
     while (first > 0) {
         const HeadRow& row = shape.rows[first - 1];
         const std::string text = TimeReader(time).TextOf(row.Views());
-        if (row.isComment || row.fields.size() != shape.fieldCount || text.empty() ||
-            !IsDigit(text[0]))
+        if (row.isComment || row.fields.size() != shape.fieldCount || text.empty())
             break;
-        const FieldKind kind = KindOfField(row.fields[time.columns[0].column], shape.decimal);
-        if (kind != FieldKind::Time && kind != FieldKind::Number)
+        const std::string& field = row.fields[time.columns[0].column];
+        const FieldKind kind = KindOfField(field, shape.decimal);
+        const bool isFaulty =
+            IsDigit(text[0]) && (kind == FieldKind::Time || kind == FieldKind::Number);
+        if (!isFaulty && !IsHashField(field))
             break;
         --first;
     }
@@ -204,6 +207,9 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
         return status;
     if (time.source != TimeSource::StartAndStep)
         run.first = WithFaultyRowsBefore(shape, time, run.first);
+    else if (shape.fieldCount == 1)
+        while (run.first > 0 && IsHashField(Trimmed(shape.rows[run.first - 1].text)))
+            --run.first;
     // Again, since the rows may start elsewhere than the kinds of their fields suggested.
     FindNames(shape, run.first, layout);
     if (!settings.decimal && CommaPartsDecimalsToo(shape, run))

@@ -5,6 +5,7 @@
 
 #include "import/bad_rows.h"
 #include "import/group_columns.h"
+#include "import/hash_fields.h"
 #include "import/item_values.h"
 #include "import/number_field.h"
 #include "import/record_reader.h"
@@ -78,10 +79,14 @@ bool RowParser::PassOver(const TableRecord& record) {
         }
         return true;
     }
-    if (CommentMarkSize(record.text, layout.commentMarks) > 0)
+    // Passed over, a value on an axis without times would shift those behind it.
+    const bool isHashValue = layout.columns.size() == 1 && IsHashField(Trimmed(record.text));
+    if (CommentMarkSize(record.text, layout.commentMarks) > 0 && !isHashValue &&
+        !IsRowWithHashes(record.text, layout.delimiter))
         return true;
     // In a single column "---" is a missing value.
-    if (layout.columns.size() > 1 && IsSeparatorLine(record.text, layout.delimiter)) {
+    if (layout.columns.size() > 1 && !IsRowWithHashes(record.text, layout.delimiter) &&
+        IsSeparatorLine(record.text, layout.delimiter)) {
         report->Dropped(DropReason::Divider).Add(record.line);
         return true;
     }
@@ -117,6 +122,15 @@ void RowParser::TakeRowWithoutTime(const TableRecord& record,
         return;
     }
     const std::string text = time.TextOf(fields);
+    const auto hashes = std::find_if(
+        layout.time.columns.begin(), layout.time.columns.end(), [&fields](const TimeColumn& part) {
+            return part.column < fields.size() && IsHashField(fields[part.column]);
+        });
+    if (hashes != layout.time.columns.end()) {
+        bad.Add(record.line, Quoted(fields[hashes->column]) + " in column " +
+                                 ColumnTitle(layout, hashes->column) + std::string(kHashAdvice));
+        return;
+    }
     // Spreadsheets export the empty rows below a table.
     if (std::all_of(fields.begin(), fields.end(), IsMissingWord)) {
         report->Dropped(DropReason::EmptyRow).Add(record.line);

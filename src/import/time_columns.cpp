@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "import/hash_fields.h"
 #include "import/table_text.h"
 #include "import/time_search.h"
 
@@ -198,9 +199,32 @@ Status Search(const SampleRows& rows, const ImportSettings& settings,
     return CheckAllUsed(given, *layout);
 }
 
+/// A column in which so many fields are such signs that it passes for one of texts: the search
+/// would take another one.
+Status CheckHashColumns(const SampleRows& rows, const TableLayout& layout) {
+    const auto& all = rows.All();
+    for (std::size_t column = 0; column < rows.ColumnCount(); ++column) {
+        const auto isHash = [column](const auto& fields) { return IsHashField(fields[column]); };
+        const auto first = std::find_if(all.begin(), all.end(), isHash);
+        const auto count = std::count_if(all.begin(), all.end(), isHash);
+        if (layout.columns[column].kind != ColumnKind::Text || first == all.end() ||
+            static_cast<std::size_t>(count) * 10 < all.size())
+            continue;
+        const auto row = static_cast<std::size_t>(first - all.begin());
+        return Status::InputFault("line " + std::to_string(rows.LineOf(row)) + ": " +
+                                  Quoted((*first)[column]) + " in column " +
+                                  ColumnTitle(layout, column) + std::string(kHashAdvice));
+    }
+    return Status::Ok();
+}
+
 } // namespace
 
 Status FindTime(const SampleRows& rows, const ImportSettings& settings, TableLayout* layout) {
+    // Who names the items need not care for the other columns.
+    if (settings.itemColumns.empty())
+        if (Status status = CheckHashColumns(rows, *layout); !status)
+            return status;
     std::vector<std::size_t> given;
     for (const std::string& name : settings.timeColumns) {
         const std::optional<std::size_t> column = FindColumn(layout->columns, name);

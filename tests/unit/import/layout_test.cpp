@@ -79,12 +79,12 @@ TEST(TableLayout, FindsDelimiterDecimalAndHeaderByItself) {
 TEST(TableLayout, PassesOverHeadersOfGaugeNetworks) {
     CheckAll({
         {"comments, names, and a line of types",
-         "# Data provided for site 01\n#    DD "
+         "#####\n### 2 sites, 2012 ###\n# Data provided for site 01\n#    DD "
          "parameter\n#\nagency_cd\tsite_no\tdatetime\tx_cd\tv\n"
          "5s\t15s\t20d\t10s\t14n\nUSGS\t02177000\t2012-09-01\tA\t191\n"
          "USGS\t02177000\t2012-09-02\tP\t213\n",
          "2012-09-01 191; 2012-09-02 213",
-         {"names in line 4", "rows from line 6", "item: \"v\""}},
+         {"names in line 6", "rows from line 8", "item: \"v\""}},
         {"names and units in comments, parts of the date in columns",
          "#YY  MM DD hh mm WDIR  WVHT\n#yr  mo dy hr mn degT     m\n2019 08 01 00 00 231  1.60\n"
          "2019 08 01 00 10 222  1.70\n",

@@ -54,6 +54,30 @@ TEST(TableRefusal, NamesTheLineOfAValueThatIsNone) {
         {WithRow("2001-01-03,<0.5,0"),
          "line 4: \"<0.5\" in column 2 \"q\" is a bound and not a value; leave such rows out with "
          "--missing \"<\", or edit them"},
+        {WithRow("2001-01-03,########,0"),
+         "line 4: \"########\" in column 2 \"q\" is what a spreadsheet writes where a column is "
+         "too narrow; widen it and export again"},
+        {WithRow("########,3.5,0"),
+         "line 4: \"########\" in column 1 \"time\" is what a spreadsheet writes where a column is "
+         "too narrow; widen it and export again"},
+        {WithRow("########,########,########"),
+         "line 4: \"########\" in column 1 \"time\" is what a spreadsheet writes where a column is "
+         "too narrow; widen it and export again"},
+        {"d;q\n#####;1,5\n2001-01-02;2\n#####;3\n",
+         "line 2: \"#####\" in column 1 \"d\" is what a spreadsheet writes where a column is too "
+         "narrow; widen it and export again"},
+        {"d,q,t\n2001-01-01,####,1\n2001-01-02,####,2\n",
+         "line 2: \"####\" in column 2 \"q\" is what a spreadsheet writes where a column is too "
+         "narrow; widen it and export again"},
+        {"q\n####\n1.5\n2.5\n",
+         "line 2: \"####\" in column 1 \"q\" is what a spreadsheet writes where a column is too "
+         "narrow; widen it and export again",
+         [] {
+             ImportOptions options;
+             options.start = "1914-01-01";
+             options.step = "1d";
+             return options;
+         }()},
         {WithRow("2001-01-03"), "line 4: ends before column 2 \"q\"; if the value is missing there "
                                 "say --missing \"\""},
     });
