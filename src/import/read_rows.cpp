@@ -85,8 +85,8 @@ bool RowParser::PassOver(const TableRecord& record) {
         !IsRowWithHashes(record.text, layout.delimiter))
         return true;
     // In a single column "---" is a missing value.
-    if (layout.columns.size() > 1 && !IsRowWithHashes(record.text, layout.delimiter) &&
-        IsSeparatorLine(record.text, layout.delimiter)) {
+    if (layout.columns.size() > 1 && IsSeparatorLine(record.text, layout.delimiter) &&
+        !IsRowWithHashes(record.text, layout.delimiter)) {
         report->Dropped(DropReason::Divider).Add(record.line);
         return true;
     }

@@ -177,7 +177,7 @@ Status Search(const SampleRows& rows, const ImportSettings& settings,
     }
     if (!isFound)
         layout->time = {};
-    const Status clock = FindClockColumn(search, layout);
+    Status clock = FindClockColumn(search, layout);
     if (isDate)
         FindZoneColumn(search, &layout->time);
     // The user's own axis goes before the table's times; these are still known not to be items.

@@ -17,8 +17,8 @@ std::string Daily(const std::vector<std::string>& values, const std::string& hea
     int day = 1;
     for (const std::string& value : values) {
         const std::string number = std::to_string(day++);
-        text +=
-            "2001-01-" + std::string(number.size() < 2 ? "0" : "") + number + "," + value + "\n";
+        text += number.size() < 2 ? "2001-01-0" : "2001-01-";
+        text.append(number).append(",").append(value).append("\n");
     }
     return text;
 }
@@ -32,36 +32,11 @@ std::string Kept(const Imported& imported) {
 }
 
 TEST(MissingValue, IsKnownByItsUsualWords) {
-    const Imported imported(Daily({"1",
-                                   "",
-                                   "NA",
-                                   "nan",
-                                   "NULL",
-                                   "-",
-                                   "--",
-                                   "***",
-                                   "ND",
-                                   "M",
-                                   "Ice",
-                                   "L\xC3\xBC"
-                                   "cke",
-                                   "l\xFC"
-                                   "cke",
-                                   "n/a",
-                                   ".",
-                                   "2",
-                                   "3",
-                                   "4",
-                                   "5",
-                                   "6",
-                                   "7",
-                                   "8",
-                                   "9",
-                                   "1.5",
-                                   "2.5",
-                                   "3.5",
-                                   "4.5",
-                                   "5.5"}));
+    const std::string latin = std::string("l\xFC") + "cke";
+    const Imported imported(
+        Daily({"1",   "",      "NA",  "nan", "NULL", "-",   "--",  "***", "ND", "M",
+               "Ice", "Lücke", latin, ".",   "2",    "3",   "4",   "5",   "6",  "7",
+               "8",   "9",     "n/a", "1.5", "2.5",  "3.5", "4.5", "5.5"}));
     EXPECT_EQ(Kept(imported), "1 2 3 4 5 6 7 8 9 1.5 2.5 3.5 4.5 5.5");
     ExpectContains(imported.Report(), "missing: empty, once");
     ExpectContains(imported.Report(), "missing: \"NULL\", once");

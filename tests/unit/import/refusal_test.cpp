@@ -9,7 +9,6 @@
 namespace ryn {
 namespace {
 
-using test::ExpectContains;
 using test::Imported;
 
 struct Refusal {
@@ -195,15 +194,14 @@ TEST(TableRefusal, RefusesSeveralSeriesInOneTable) {
     CheckAll({
         {"station,date,q\nA,2001-01-01,1\nA,2001-01-02,2\nB,2002-01-01,3\nB,2002-01-02,4\n",
          "line 4: \"B\" in column 1 \"station\" is another series than \"A\" in line 2" + rest},
-        {"Datum;Messgr\xC3\xB6\xC3\x9F"
-         "e;Wert\n1.1.2001 00:00;W;1\n1.1.2001 01:00;Q;2\n1.1.2001 02:00;W;3\n"
+        {"Datum;Messgröße;Wert\n1.1.2001 00:00;W;1\n1.1.2001 01:00;Q;2\n1.1.2001 02:00;W;3\n"
          "1.1.2001 03:00;T;4\n13.1.2001 00:00;Q;2\n",
-         "line 3: \"Q\" in column 2 \"Messgr\xC3\xB6\xC3\x9F"
-         "e\" is another series than \"W\" in line 2 (3 in all)" +
+         "line 3: \"Q\" in column 2 \"Messgröße\" is another series than \"W\" in line 2 (3 in "
+         "all)" +
              rest},
-        {"\xE8\xA6\xB3\xE6\xB8\xAC\xE6\x89\x80,d,q\nx,2001-01-01,1\n,2001-01-02,2\n"
+        {"観測所,d,q\nx,2001-01-01,1\n,2001-01-02,2\n"
          "y,2002-01-01,3\n,2002-01-02,4\n",
-         "line 4: \"y\" in column 1 \"\xE8\xA6\xB3\xE6\xB8\xAC\xE6\x89\x80\" is another "
+         "line 4: \"y\" in column 1 \"観測所\" is another "
          "series than \"x\" in line 2" +
              rest},
         {"site_no,d,q\n11,2001-01-01,1\n11,2001-01-02,2\n12,2001-01-01,3\n12,2001-01-03,4\n",

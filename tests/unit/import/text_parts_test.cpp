@@ -141,10 +141,7 @@ TEST(DateText, KnowsMonthsOfSevenLanguages) {
         {"Sep", "september", "septiembre", "settembre", "setembro"},
         {"Oct", "Okt", "oktober", "ottobre", "outubro"},
         {"Nov", "november"},
-        {"Dec", "Dez", "dezembro",
-         "d\xC3\xA9"
-         "cembre",
-         "diciembre", "dicembre"},
+        {"Dec", "Dez", "dezembro", "décembre", "diciembre", "dicembre"},
     };
     for (std::size_t i = 0; i < months.size(); ++i)
         for (const char* name : months[i])
