@@ -69,6 +69,11 @@ bool TakeColonClock(TextCursor* cursor, TimeParts* parts) {
     return true;
 }
 
+/// Asked before words are compared: this runs for each row, and nearly none has one.
+bool IsLetterAhead(const TextCursor& cursor) {
+    return IsLetter(cursor.Peek()) || static_cast<unsigned char>(cursor.Peek()) >= 0x80;
+}
+
 /// Of a number with one of these words behind it; -1 and the cursor as it was for another text.
 int TakeUnit(TextCursor* cursor, std::string_view words) {
     TextCursor ahead = *cursor;
@@ -76,7 +81,7 @@ int TakeUnit(TextCursor* cursor, std::string_view words) {
     ahead.SkipBlanks();
     const int value = ahead.TakeNumber(2, &digits);
     ahead.SkipBlanks();
-    if (digits == 0 || !IsOneOf(ahead.TakeWord(), words))
+    if (digits == 0 || !IsLetterAhead(ahead) || !IsOneOf(ahead.TakeWord(), words))
         return -1;
     *cursor = ahead;
     return value;
@@ -107,7 +112,7 @@ bool TakeHourWord(TextCursor* cursor, TimeParts* parts) {
 void SkipHourWord(TextCursor* cursor) {
     TextCursor ahead = *cursor;
     ahead.SkipBlanks();
-    if (IsOneOf(ahead.TakeWord(), "h|hr|hrs|uhr|uur|heures"))
+    if (IsLetterAhead(ahead) && IsOneOf(ahead.TakeWord(), "h|hr|hrs|uhr|uur|heures"))
         *cursor = ahead;
 }
 
@@ -115,6 +120,8 @@ void SkipHourWord(TextCursor* cursor) {
 bool TakeHalfOfDay(TextCursor* cursor, TimeParts* parts) {
     TextCursor ahead = *cursor;
     ahead.SkipBlanks();
+    if (!IsLetterAhead(ahead))
+        return true;
     const std::string_view word = ahead.TakeWord();
     const bool isAfternoon = IsOneOf(word, "pm|p");
     const bool isAbbreviated =
