@@ -69,14 +69,67 @@ bool TakeColonClock(TextCursor* cursor, TimeParts* parts) {
     return true;
 }
 
+/// Asked before words are compared: this runs for each row, and nearly none has one.
+bool IsLetterAhead(const TextCursor& cursor) {
+    return IsLetter(cursor.Peek()) || static_cast<unsigned char>(cursor.Peek()) >= 0x80;
+}
+
+/// Of a number with one of these words behind it; -1 and the cursor as it was for another text.
+int TakeUnit(TextCursor* cursor, std::string_view words) {
+    TextCursor ahead = *cursor;
+    int digits = 0;
+    ahead.SkipBlanks();
+    const int value = ahead.TakeNumber(2, &digits);
+    ahead.SkipBlanks();
+    if (digits == 0 || !IsLetterAhead(ahead) || !IsOneOf(ahead.TakeWord(), words))
+        return -1;
+    *cursor = ahead;
+    return value;
+}
+
+/// "7h30", "7 h", "7 Uhr 30", "9時30分": false, and the parts as they were, for another text.
+bool TakeHourWord(TextCursor* cursor, TimeParts* parts) {
+    TextCursor ahead = *cursor;
+    const int hour = TakeUnit(&ahead, "h|hr|hrs|uhr|u|uur|heures|時");
+    if (hour < 0)
+        return false;
+    parts->hour = hour;
+    parts->minute = TakeUnit(&ahead, "m|min|分");
+    if (parts->minute >= 0)
+        parts->second = TakeUnit(&ahead, "s|sec|秒");
+    *cursor = ahead;
+    ahead.SkipBlanks();
+    int digits = 0;
+    const int minute = ahead.TakeNumber(2, &digits);
+    if (parts->minute >= 0 || digits != 2)
+        return true;
+    parts->minute = minute;
+    *cursor = ahead;
+    return true;
+}
+
+/// "0730 hrs", "7:30 Uhr".
+void SkipHourWord(TextCursor* cursor) {
+    TextCursor ahead = *cursor;
+    ahead.SkipBlanks();
+    if (IsLetterAhead(ahead) && IsOneOf(ahead.TakeWord(), "h|hr|hrs|uhr|uur|heures"))
+        *cursor = ahead;
+}
+
 /// "AM" or "PM" behind a time of the twelve-hour clock.
 bool TakeHalfOfDay(TextCursor* cursor, TimeParts* parts) {
     TextCursor ahead = *cursor;
     ahead.SkipBlanks();
-    const std::string_view word = ahead.TakeWord();
-    const bool isAfternoon = IsOneOf(word, "pm");
-    if (!isAfternoon && !IsOneOf(word, "am"))
+    if (!IsLetterAhead(ahead))
         return true;
+    const std::string_view word = ahead.TakeWord();
+    const bool isAfternoon = IsOneOf(word, "pm|p");
+    const bool isAbbreviated =
+        IsOneOf(word, "a|p") && ahead.Take('.') && IsOneOf(ahead.TakeWord(), "m");
+    if (!isAbbreviated && !IsOneOf(word, "am|pm"))
+        return true;
+    if (isAbbreviated)
+        ahead.Take('.');
     if (parts->hour < 1 || parts->hour > 12)
         return false;
     // 12 AM is midnight, 12 PM is noon.
@@ -137,18 +190,21 @@ bool ParseZoneTail(std::string_view text, TimeParts* parts) {
 
 bool ParseClock(std::string_view text, TimeParts* parts) {
     TextCursor cursor(text);
+    if (TakeHourWord(&cursor, parts))
+        return ParseZoneTail(cursor.Rest(), parts);
     int digits = 0;
     const int value = cursor.TakeNumber(6, &digits);
     if (digits == 0 || IsDigit(cursor.Peek()))
         return false;
     const bool isTwelveHour = IsLetter(TextCursor(Trimmed(cursor.Rest())).Peek());
-    if (cursor.Take(':') || cursor.Take('h')) {
+    if (cursor.Take(':')) {
         parts->hour = value;
         if (digits > 2 || !TakeColonClock(&cursor, parts))
             return false;
     } else if (!SetPlainClock(value, isTwelveHour && digits == 1 ? 2 : digits, parts)) {
         return false;
     }
+    SkipHourWord(&cursor);
     return TakeHalfOfDay(&cursor, parts) && ParseZoneTail(cursor.Rest(), parts);
 }
 

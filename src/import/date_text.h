@@ -29,7 +29,8 @@ enum class DateForm {
 /// fields are not checked against each other here (MomentOf does).
 TimeResult ParseDate(std::string_view text, DateForm form, TimeParts* parts);
 
-/// A time of day: "23:59", "23:59:59.5", "2359", "23", "11:59 PM", with or without a zone behind.
+/// A time of day: "23:59", "23:59:59.5", "2359", "23", "11:59 PM", "7h30", "0730 hrs", "9時30分",
+/// with or without a zone behind.
 bool ParseClock(std::string_view text, TimeParts* parts);
 
 /// A zone's name, "Z", "+01:00", "UTC", "CET", "EDT", ...; its offset in minutes from UTC.

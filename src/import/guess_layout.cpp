@@ -5,6 +5,7 @@
 
 #include "import/comma_parts.h"
 #include "import/date_order.h"
+#include "import/hash_fields.h"
 #include "import/item_columns.h"
 #include "import/spread_columns.h"
 #include "import/stray_rows.h"
@@ -75,9 +76,10 @@ std::size_t WithFaultyRowsBefore(const TableShape& shape, const TimeLayout& time
         if (row.isComment || row.fields.size() != shape.fieldCount)
             break;
         const std::string text = TimeReader(time).TextOf(row.Views());
-        const FieldKind kind = KindOfField(row.fields[time.columns[0].column], shape.decimal);
+        const std::string& field = row.fields[time.columns[0].column];
+        const FieldKind kind = KindOfField(field, shape.decimal);
         const bool startsAsNumber = !text.empty() && IsDigit(text[0]) && kind == FieldKind::Number;
-        if (kind != FieldKind::Time && !startsAsNumber)
+        if (kind != FieldKind::Time && !startsAsNumber && !IsHashField(field))
             break;
         --first;
     }
@@ -110,7 +112,8 @@ bool HasTwoDigitYears(const SampleRows& rows, const TimeLayout& time) {
 /// Rules that place values at moments which the table does not write; the user has to know them.
 void NoteTimeRules(const SampleRows& rows, const ImportSettings& settings, TableLayout* layout) {
     const TimeLayout& time = layout->time;
-    if (HasTwoDigitYears(rows, time) || (time.pattern && time.pattern->Has("y")))
+    if (HasTwoDigitYears(rows, time) ||
+        (time.pattern && time.pattern->Has("y") && !time.pattern->Has("Y")))
         layout->notes.emplace_back(
             "two-digit years: 30 to 99 are 1930 to 1999, 00 to 29 are 2000 to 2029");
     const bool isDate = !time.columns.empty() && time.columns[0].role == TimeRole::Date;
@@ -161,6 +164,9 @@ Status LayOut(const TableShape& shape, const ImportSettings& settings, TableLayo
         return status;
     if (time.source != TimeSource::StartAndStep)
         run.first = WithFaultyRowsBefore(shape, time, run.first);
+    else if (shape.fieldCount == 1)
+        while (run.first > 0 && IsHashField(Trimmed(shape.rows[run.first - 1].text)))
+            --run.first;
     // Again, since the rows may start elsewhere than the kinds of their fields suggested.
     FindNames(shape, run.first, layout);
     ReadPreamble(shape, run.first, layout);

@@ -141,7 +141,8 @@ Status ParseEncoding(const std::string& text, std::optional<TextEncoding>* encod
     *encoding = EncodingOfName(text);
     return *encoding
                ? Status::Ok()
-               : Unknown("encoding", text, "utf-8, latin-1, windows-1252, utf-16le or utf-16be");
+               : Unknown("encoding", text,
+                         "utf-8, latin-1, windows-1252, utf-16le, utf-16be, shift_jis or euc-jp");
 }
 
 } // namespace

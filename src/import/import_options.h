@@ -23,7 +23,7 @@ struct ImportOptions {
     std::string delimiter;  ///< one character, or comma, semicolon, tab, bar, blank
     std::string decimal;    ///< "." or ","
     std::string comment;    ///< lines that begin so are passed over
-    std::string encoding;   ///< "utf-8", "latin-1", ...
+    std::string encoding;   ///< "utf-8", "latin-1", "shift_jis", ...
     std::string timeFormat; ///< as for TimePattern, or excel, unix, decimal-year, year
     std::string start;      ///< with step the axis itself; alone, parts that the columns lack
     std::string step;       ///< as for ParseTimeStep

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "import/hash_fields.h"
 #include "import/table_text.h"
 
 namespace ryn {
@@ -70,6 +71,10 @@ ValueResult ItemValues::Refuse(long line, std::size_t column, std::string_view f
                  std::string(field.substr(0, 1)) + "\", or edit them";
         break;
     default:
+        if (IsHashField(field)) {
+            fault += kHashAdvice;
+            break;
+        }
         fault += " is no number";
         if (std::none_of(field.begin(), field.end(), IsDigit))
             fault += "; if it marks a missing value say so with --missing";

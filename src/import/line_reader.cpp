@@ -9,18 +9,12 @@ namespace {
 
 constexpr std::size_t kBlock = std::size_t{1} << 18;
 
-/// These are converted while they are read, so that everything behind sees one byte a character.
-bool IsUtf16(TextEncoding encoding) {
-    return encoding == TextEncoding::Utf16LittleEndian || encoding == TextEncoding::Utf16BigEndian;
-}
-
 } // namespace
 
 LineReader::LineReader(TextSource& textSource, TextEncoding textEncoding)
     : source(textSource),
       encoding(textEncoding) {
-    if (IsUtf16(encoding))
-        decoder.emplace(encoding);
+    error = MakeDecoder(encoding, &decoder);
 }
 
 ReadResult LineReader::Fail(std::string reason) {
@@ -88,6 +82,8 @@ ReadResult LineReader::GiveLine(std::size_t length, std::size_t lengthWithEnd,
 }
 
 ReadResult LineReader::Read(std::string_view* line) {
+    if (!error)
+        return ReadResult::Failed;
     while (!FindLineEnd()) {
         if (buffer.size() - begin > kLongestLine + 1)
             return GiveLine(buffer.size() - begin, 0, line);

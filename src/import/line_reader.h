@@ -1,11 +1,12 @@
 #pragma once
 
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
 
 #include "base/status.h"
-#include "import/text_encoding.h"
+#include "import/text_decoder.h"
 #include "import/text_source.h"
 
 namespace ryn {
@@ -14,7 +15,8 @@ namespace ryn {
 enum class ReadResult { Found, End, Failed };
 
 /// Lines of a table without their ends, which may be LF, CRLF or CR, also mixed. Holds one block
-/// and one line, never the file. UTF-16 comes out as UTF-8; other encodings as they are.
+/// and one line, never the file. Encodings with a decoder come out as UTF-8; others as they
+/// are.
 class LineReader {
   public:
     /// A longer line is a fault: no table has one, and it would take all memory.
@@ -42,7 +44,7 @@ class LineReader {
 
     TextSource& source;
     TextEncoding encoding;
-    std::optional<Utf16Decoder> decoder;
+    std::unique_ptr<TextDecoder> decoder;
     std::string buffer;
     std::size_t begin = 0;
     // Where the next LF and CR stand, so that a file without CRs is searched for them once a block.

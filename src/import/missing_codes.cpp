@@ -146,10 +146,15 @@ class CodeSearch {
             isFine = isFine || (value != std::floor(value) && !IsHuge(value));
         }
         Split(series);
+        FindLonely();
     }
 
     std::vector<Extreme> clear;
     std::vector<Extreme> doubtful;
+    /// Of one digit ("-9", "-8.88"), where a series has hardly any other negative value.
+    std::vector<Extreme> lonely;
+
+    bool IsLonely(float value) const { return Holds(lonely, value); }
 
   private:
     /// Candidates are the outermost values as long as they look like codes. The innermost is judged
@@ -166,6 +171,24 @@ class CodeSearch {
         for (std::size_t i = highs; i-- > 0;)
             if (!IsAmong(low, lows, high.All()[i].value))
                 Judge(high.All()[i], IsClearHigh(high.All()[i], rest), &rest);
+    }
+    void FindLonely() {
+        constexpr std::size_t kFew = 2;
+        std::size_t negatives = 0;
+        for (const Extreme& extreme : low.All()) {
+            if (extreme.value >= 0.0F || Holds(clear, extreme.value))
+                continue;
+            ++negatives;
+            const std::string digits = DigitsOf(extreme.value);
+            if (extreme.value <= -1.0F && IsRepeatedDigit(digits, digits.substr(0, 1), 1))
+                lonely.push_back(extreme);
+        }
+        if (negatives > kFew)
+            lonely.clear();
+    }
+    static bool Holds(const std::vector<Extreme>& list, float value) {
+        return std::any_of(list.begin(), list.end(),
+                           [value](const Extreme& known) { return known.value == value; });
     }
     void Judge(const Extreme& code, bool isClear, Rest* rest) {
         if (!isClear)
@@ -210,11 +233,13 @@ void TakeAnnounced(const TableLayout& layout, const std::string& where, std::vec
     }
 }
 
+/// Worth a note: often, or written longer than a measurement is.
+bool IsStriking(const Extreme& code) {
+    return code.count >= 3 || DigitsOf(code.value).size() >= 4 || IsRoundedNines(code.value);
+}
+
 /// Values that look like codes stay, but the user is asked to look.
 void NoteDoubtful(const Extreme& code, const std::string& column, ImportReport* report) {
-    const bool isLong = DigitsOf(code.value).size() >= 4 || IsRoundedNines(code.value);
-    if (code.count < 3 && !isLong)
-        return;
     report->notes.push_back(ShortestText(code.value) + " occurs " +
                             (code.count == 1 ? "once" : std::to_string(code.count) + " times") +
                             " in column " + column +
@@ -238,6 +263,9 @@ void TakeOutCodes(const TableLayout& layout, TableSamples* samples, ImportReport
                 {ShortestText(code.value), Replace(code.value, series),
                  where + "far from all other values; --missing none takes it as a value"});
         for (const Extreme& code : search.doubtful)
+            if (IsStriking(code) && !search.IsLonely(code.value))
+                NoteDoubtful(code, column, report);
+        for (const Extreme& code : search.lonely)
             NoteDoubtful(code, column, report);
     }
 }

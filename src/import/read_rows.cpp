@@ -6,6 +6,8 @@
 #include "import/bad_rows.h"
 #include "import/comma_parts.h"
 #include "import/field_split.h"
+#include "import/group_columns.h"
+#include "import/hash_fields.h"
 #include "import/item_values.h"
 #include "import/number_field.h"
 #include "import/record_reader.h"
@@ -26,6 +28,7 @@ class RowParser {
           report(importReport),
           values(tableLayout, missingRules, importReport, &bad),
           time(tableLayout.time),
+          groups(tableLayout),
           row(tableLayout.items.size()) {
         samples->values.resize(layout.items.size());
         samples->isRelative = layout.time.isRelative;
@@ -54,6 +57,7 @@ class RowParser {
     BadRows bad;
     ItemValues values;
     TimeReader time;
+    GroupColumns groups;
     std::vector<float> row;
     std::int64_t steps = 0;  // rows before this one, for an axis of start and step
     DroppedRows pendingText; // lines of text, which are a footer when no row follows
@@ -78,10 +82,14 @@ bool RowParser::PassOver(const TableRecord& record) {
         }
         return true;
     }
-    if (CommentMarkSize(record.text, layout.commentMarks) > 0)
+    // Passed over, a value on an axis without times would shift those behind it.
+    const bool isHashValue = layout.columns.size() == 1 && IsHashField(Trimmed(record.text));
+    if (CommentMarkSize(record.text, layout.commentMarks) > 0 && !isHashValue &&
+        !IsRowWithHashes(record.text, layout.delimiter))
         return true;
     // In a single column "---" is a missing value.
-    if (layout.columns.size() > 1 && IsSeparatorLine(record.text, layout.delimiter)) {
+    if (layout.columns.size() > 1 && IsSeparatorLine(record.text, layout.delimiter) &&
+        !IsRowWithHashes(record.text, layout.delimiter)) {
         report->Dropped(DropReason::Divider).Add(record.line);
         return true;
     }
@@ -117,6 +125,15 @@ void RowParser::TakeRowWithoutTime(const TableRecord& record,
         return;
     }
     const std::string text = time.TextOf(fields);
+    const auto hashes = std::find_if(
+        layout.time.columns.begin(), layout.time.columns.end(), [&fields](const TimeColumn& part) {
+            return part.column < fields.size() && IsHashField(fields[part.column]);
+        });
+    if (hashes != layout.time.columns.end()) {
+        bad.Add(record.line, Quoted(fields[hashes->column]) + " in column " +
+                                 ColumnTitle(layout, hashes->column) + std::string(kHashAdvice));
+        return;
+    }
     // Spreadsheets export the empty rows below a table.
     if (std::all_of(fields.begin(), fields.end(), IsMissingWord)) {
         report->Dropped(DropReason::EmptyRow).Add(record.line);
@@ -217,11 +234,14 @@ void RowParser::TakeRow(const TableRecord& record, const std::vector<std::string
         return;
     if (fields.size() > layout.columns.size() && HasDigitsTooMany(record, fields))
         return;
+    const std::size_t before = samples->Count();
     if (layout.months.empty())
         TakeSample(record.line, moment, fields, layout.items);
     for (std::size_t month = 0; month < layout.months.size(); ++month)
         TakeSample(record.line, *Advance(moment, {static_cast<int>(month), 0}, month > 0 ? 1 : 0),
                    fields, {layout.months[month]});
+    if (samples->Count() > before)
+        groups.Add(record.line, moment, fields);
 }
 
 void RowParser::TakeSample(long line, Millis moment, const std::vector<std::string_view>& fields,
@@ -249,6 +269,8 @@ Status RowParser::Finish(const std::string& source) {
     const Status verdict = values.DecimalVerdict();
     if (!verdict)
         return Status::InputFault(source + ": " + verdict.Text());
+    if (Status status = groups.Check(source); !status)
+        return status;
     if (pendingText.count > 0)
         for (const long line : pendingText.firstLines)
             report->Dropped(DropReason::Footer).Add(line);

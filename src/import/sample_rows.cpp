@@ -15,8 +15,10 @@ SampleRows::SampleRows(const TableShape& shape, const RowRun& run,
     for (std::size_t i = run.first; i <= run.last && i < shape.rows.size(); ++i) {
         const HeadRow& row = shape.rows[i];
         // Rows of another size, empty ones and headers within say nothing about single columns.
-        if (row.hasData && row.fields.size() == shape.fieldCount)
-            rows.push_back(row.Views());
+        if (!row.hasData || row.fields.size() != shape.fieldCount)
+            continue;
+        rows.push_back(row.Views());
+        lines.push_back(row.line);
     }
 }
 

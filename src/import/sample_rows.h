@@ -24,12 +24,15 @@ class SampleRows {
     const ColumnLayout& Column(std::size_t index) const { return columns[index]; }
     std::size_t ColumnCount() const { return columns.size(); }
     char Decimal() const { return decimal; }
+    /// Of the row at a position in All().
+    long LineOf(std::size_t row) const { return lines[row]; }
 
     /// Whether a column has so many digits in every row, and nothing else, or is empty there.
     bool HasDigitsOnly(std::size_t column, std::size_t size) const;
 
   private:
     std::vector<std::vector<std::string_view>> rows;
+    std::vector<long> lines;
     const std::vector<ColumnLayout>& columns;
     char decimal;
 };

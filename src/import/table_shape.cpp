@@ -5,6 +5,7 @@
 
 #include "import/clock_text.h"
 #include "import/field_split.h"
+#include "import/hash_fields.h"
 #include "import/number_field.h"
 #include "import/table_text.h"
 
@@ -65,10 +66,11 @@ class HeadSplitter {
         row->line = line.number;
         row->text = line.text;
         const std::size_t mark = CommentMarkSize(line.text, marks);
-        row->isComment = mark > 0;
+        row->isComment = mark > 0 && !IsRowWithHashes(line.text, delimiter);
         row->isDivider = !row->isComment && IsSeparatorLine(line.text, delimiter);
         std::size_t used = 1;
-        bool isClosed = list.Split(std::string_view(row->text).substr(mark), delimiter);
+        const std::size_t cut = row->isComment ? mark : 0;
+        bool isClosed = list.Split(std::string_view(row->text).substr(cut), delimiter);
         while (!isClosed && !row->isComment && used < kMostJoinedLines &&
                index + used < head.lines.size() && looked < kMostJoinedBytes) {
             row->text += "\n" + head.lines[index + used++].text;
@@ -79,7 +81,7 @@ class HeadSplitter {
             // In a preamble an inch sign, in a row a fault that reading will name.
             used = 1;
             row->text = line.text;
-            list.SplitUnquoted(std::string_view(row->text).substr(mark), delimiter);
+            list.SplitUnquoted(std::string_view(row->text).substr(cut), delimiter);
         }
         row->fields.assign(list.All().begin(), list.All().end());
         return used;
@@ -252,7 +254,7 @@ bool IsFaultyRow(const TableShape& shape, const HeadRow& row) {
     if (row.fields.size() != shape.fieldCount)
         return false;
     if (std::all_of(row.fields.begin(), row.fields.end(),
-                    [](const std::string& field) { return IsMissingWord(field); }))
+                    [](const auto& field) { return IsMissingWord(field) || IsHashField(field); }))
         return true;
     const Matches matches = MatchRow(shape, row);
     return matches.yes > 0 && matches.yes >= matches.no;

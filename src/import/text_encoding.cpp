@@ -4,6 +4,7 @@
 #include <array>
 #include <cstdint>
 
+#include "import/japanese_text.h"
 #include "import/table_text.h"
 
 namespace ryn {
@@ -18,25 +19,6 @@ constexpr std::array<std::uint16_t, 32> kWindows1252 = {
 
 unsigned Byte(char c) {
     return static_cast<unsigned char>(c);
-}
-
-void AppendUtf8(unsigned code, std::string* text) {
-    const auto put = [text](unsigned byte) { text->push_back(static_cast<char>(byte)); };
-    if (code < 0x80) {
-        put(code);
-    } else if (code < 0x800) {
-        put(0xC0 | (code >> 6));
-        put(0x80 | (code & 0x3F));
-    } else if (code < 0x10000) {
-        put(0xE0 | (code >> 12));
-        put(0x80 | ((code >> 6) & 0x3F));
-        put(0x80 | (code & 0x3F));
-    } else {
-        put(0xF0 | (code >> 18));
-        put(0x80 | ((code >> 12) & 0x3F));
-        put(0x80 | ((code >> 6) & 0x3F));
-        put(0x80 | (code & 0x3F));
-    }
 }
 
 /// Of a UTF-8 sequence by its first byte; 0 for a byte that begins none.
@@ -84,6 +66,25 @@ bool ZerosAtEveryOther(std::string_view text, std::size_t first) {
 
 } // namespace
 
+void AppendUtf8(unsigned code, std::string* text) {
+    const auto put = [text](unsigned byte) { text->push_back(static_cast<char>(byte)); };
+    if (code < 0x80) {
+        put(code);
+    } else if (code < 0x800) {
+        put(0xC0 | (code >> 6));
+        put(0x80 | (code & 0x3F));
+    } else if (code < 0x10000) {
+        put(0xE0 | (code >> 12));
+        put(0x80 | ((code >> 6) & 0x3F));
+        put(0x80 | (code & 0x3F));
+    } else {
+        put(0xF0 | (code >> 18));
+        put(0x80 | ((code >> 12) & 0x3F));
+        put(0x80 | ((code >> 6) & 0x3F));
+        put(0x80 | (code & 0x3F));
+    }
+}
+
 std::string EncodingName(TextEncoding encoding) {
     switch (encoding) {
     case TextEncoding::Utf8:
@@ -94,6 +95,10 @@ std::string EncodingName(TextEncoding encoding) {
         return "UTF-16LE";
     case TextEncoding::Utf16BigEndian:
         return "UTF-16BE";
+    case TextEncoding::ShiftJis:
+        return "Shift_JIS";
+    case TextEncoding::EucJp:
+        return "EUC-JP";
     }
     return {};
 }
@@ -111,6 +116,11 @@ std::optional<TextEncoding> EncodingOfName(std::string_view name) {
             return TextEncoding::Windows1252;
     if (key == "utf16le" || key == "utf16")
         return TextEncoding::Utf16LittleEndian;
+    for (const char* known : {"shiftjis", "sjis", "cp932", "mskanji", "windows31j"})
+        if (key == known)
+            return TextEncoding::ShiftJis;
+    if (key == "eucjp")
+        return TextEncoding::EucJp;
     if (key == "utf16be")
         return TextEncoding::Utf16BigEndian;
     return std::nullopt;
@@ -126,8 +136,12 @@ TextEncoding GuessEncoding(std::string_view start) {
         return TextEncoding::Utf16LittleEndian;
     if (ZerosAtEveryOther(start, 0))
         return TextEncoding::Utf16BigEndian;
-    // Text in a single-byte encoding with an accent in it is hardly ever valid UTF-8 by chance.
-    return IsUtf8(start, Tail::MayBeCut) ? TextEncoding::Utf8 : TextEncoding::Windows1252;
+    // Text in another encoding with an accent in it is hardly ever valid UTF-8 by chance.
+    if (IsUtf8(start, Tail::MayBeCut))
+        return TextEncoding::Utf8;
+    if (LooksLikeEucJp(start))
+        return TextEncoding::EucJp;
+    return LooksLikeShiftJis(start) ? TextEncoding::ShiftJis : TextEncoding::Windows1252;
 }
 
 std::size_t ByteOrderMarkSize(std::string_view start, TextEncoding encoding) {
@@ -151,38 +165,6 @@ std::string ToUtf8(std::string_view text, TextEncoding encoding) {
         AppendUtf8(byte >= 0x80 && byte < 0xA0 ? kWindows1252[byte - 0x80] : byte, &result);
     }
     return result;
-}
-
-void Utf16Decoder::Decode(std::string_view bytes, std::string* text) {
-    for (const char c : bytes) {
-        const auto byte = static_cast<unsigned char>(c);
-        if (!oddByte) {
-            oddByte = byte;
-            continue;
-        }
-        const unsigned first = *oddByte;
-        oddByte.reset();
-        TakeUnit(order == TextEncoding::Utf16LittleEndian ? first | (unsigned{byte} << 8)
-                                                          : (first << 8) | byte,
-                 text);
-    }
-}
-
-void Utf16Decoder::TakeUnit(unsigned unit, std::string* text) {
-    const bool isLow = unit >= 0xDC00 && unit < 0xE000;
-    if (highSurrogate != 0) {
-        const unsigned high = highSurrogate;
-        highSurrogate = 0;
-        if (isLow) {
-            AppendUtf8(0x10000 + ((high - 0xD800) << 10) + (unit - 0xDC00), text);
-            return;
-        }
-        AppendUtf8(0xFFFD, text);
-    }
-    if (unit >= 0xD800 && unit < 0xDC00)
-        highSurrogate = unit;
-    else
-        AppendUtf8(isLow ? 0xFFFD : unit, text);
 }
 
 } // namespace ryn

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "import/hash_fields.h"
 #include "import/table_text.h"
 #include "import/time_search.h"
 
@@ -107,6 +108,24 @@ Status NoTime(PartsResult parts, const ImportSettings& settings, const TableLayo
                               " does not read as time; tell its form with --time-format");
 }
 
+/// "1999/00" names the year that begins in 1999, at a day that the table does not tell.
+Status RefuseHydrologicalYears(const SampleRows& rows, std::size_t column,
+                               const TableLayout& layout) {
+    std::size_t row = 0;
+    while (!IsHydrologicalYear(rows.All()[row][column]))
+        ++row;
+    constexpr std::size_t kYearSize = 4;
+    const std::string_view first = rows.All()[row][column];
+    const std::string format = "%Y" + std::string(first.substr(kYearSize, 1)) +
+                               (first.size() > 2 * kYearSize ? "%Y" : "%y");
+    return Status::InputFault(
+        "line " + std::to_string(rows.LineOf(row)) + ": " + Quoted(first) +
+        " and the like in column " + ColumnTitle(layout, column) +
+        " are hydrological years, not months; take the year in which each begins with "
+        "--time-format " +
+        format + " (and its first day with --start, such as 1999-10-01)");
+}
+
 /// The axis of --start and --step; columns with times are told, and are no items.
 void UseStep(const ImportSettings& settings, TableLayout* layout) {
     TimeLayout& time = layout->time;
@@ -150,6 +169,7 @@ Status Search(const SampleRows& rows, const ImportSettings& settings,
                             settings.start.has_value()};
     PartsResult parts = PartsResult::None;
     bool isFound = FindDateColumn(search, &layout->time);
+    const bool isDate = isFound;
     if (!isFound) {
         parts = FindPartColumns(search, &layout->time);
         isFound = parts == PartsResult::Found ||
@@ -157,22 +177,54 @@ Status Search(const SampleRows& rows, const ImportSettings& settings,
     }
     if (!isFound)
         layout->time = {};
+    Status clock = FindClockColumn(search, layout);
+    if (isDate)
+        FindZoneColumn(search, &layout->time);
     // The user's own axis goes before the table's times; these are still known not to be items.
     if (settings.step) {
         UseStep(settings, layout);
         return Status::Ok();
     }
+    const std::optional<std::size_t> hydrological =
+        isFound ? std::nullopt : FindHydrologicalYears(search);
+    if (hydrological)
+        return RefuseHydrologicalYears(rows, *hydrological, *layout);
     if (!isFound)
         return NoTime(parts, settings, *layout);
+    if (!clock)
+        return clock;
     UseStart(settings, layout);
     if (LacksMonth(layout->time))
         layout->notes.emplace_back("the month is that of --start: no column gives it");
     return CheckAllUsed(given, *layout);
 }
 
+/// A column in which so many fields are such signs that it passes for one of texts: the search
+/// would take another one.
+Status CheckHashColumns(const SampleRows& rows, const TableLayout& layout) {
+    const auto& all = rows.All();
+    for (std::size_t column = 0; column < rows.ColumnCount(); ++column) {
+        const auto isHash = [column](const auto& fields) { return IsHashField(fields[column]); };
+        const auto first = std::find_if(all.begin(), all.end(), isHash);
+        const auto count = std::count_if(all.begin(), all.end(), isHash);
+        if (layout.columns[column].kind != ColumnKind::Text || first == all.end() ||
+            static_cast<std::size_t>(count) * 10 < all.size())
+            continue;
+        const auto row = static_cast<std::size_t>(first - all.begin());
+        return Status::InputFault("line " + std::to_string(rows.LineOf(row)) + ": " +
+                                  Quoted((*first)[column]) + " in column " +
+                                  ColumnTitle(layout, column) + std::string(kHashAdvice));
+    }
+    return Status::Ok();
+}
+
 } // namespace
 
 Status FindTime(const SampleRows& rows, const ImportSettings& settings, TableLayout* layout) {
+    // Who names the items need not care for the other columns.
+    if (settings.itemColumns.empty())
+        if (Status status = CheckHashColumns(rows, *layout); !status)
+            return status;
     std::vector<std::size_t> given;
     for (const std::string& name : settings.timeColumns) {
         const std::optional<std::size_t> column = FindColumn(layout->columns, name);

@@ -13,16 +13,17 @@ struct RoleWords {
     std::string_view words;
 };
 
-// In English, German, Dutch, French, Italian, Spanish, Portuguese and the Nordic languages.
+// In English, German, Dutch, French, Italian, Spanish, Portuguese the Nordic languages and
+// Japanese.
 constexpr RoleWords kRoles[] = {
     {TimeRole::Year, "year|years|yr|yyyy|yy|y|jaar|jahr|année|annee|anno|año|ano|år|rok|vuosi|wy|"
-                     "wateryear|hyear"},
-    {TimeRole::Month, "month|mon|mo|mm|m|mnth|mth|maand|monat|mois|mese|mes|måned|månad"},
-    {TimeRole::Day, "day|dy|dd|d|mday|dag|tag|jour|giorno|dia|día"},
+                     "wateryear|hyear|年"},
+    {TimeRole::Month, "month|mon|mo|mm|m|mnth|mth|maand|monat|mois|mese|mes|måned|månad|月"},
+    {TimeRole::Day, "day|dy|dd|d|mday|dag|tag|jour|giorno|dia|día|日"},
     {TimeRole::DayOfYear, "doy|jday|yday|julian|dayofyear"},
-    {TimeRole::Hour, "hour|hours|hr|hh|h|uur|uhr|stunde|heure|ora|hora"},
-    {TimeRole::Minute, "minute|minutes|min|mn|mi|minuut|minuto"},
-    {TimeRole::Second, "second|seconds|sec|ss"}};
+    {TimeRole::Hour, "hour|hours|hr|hh|h|uur|uhr|stunde|heure|ora|hora|時"},
+    {TimeRole::Minute, "minute|minutes|min|mn|mi|minuut|minuto|分"},
+    {TimeRole::Second, "second|seconds|sec|ss|秒"}};
 
 std::optional<TimeRole> RoleOfWord(std::string_view word) {
     for (const RoleWords& known : kRoles)
@@ -82,10 +83,11 @@ bool IsTimeName(const std::string& name) {
     if (words.size() > 1 && std::all_of(words.begin(), words.end(), RoleOfWord)) // "hh:mm"
         return true;
     return std::any_of(words.begin(), words.end(), [](const std::string& word) {
-        return IsOneOf(word,
-                       "date|time|datetime|timestamp|datum|zeit|zeitpunkt|uhrzeit|tijd|fecha|data|"
-                       "dato|heure|hora|dt|tm|tmstp|epoch|hhmm|yyyymm|yyyymmdd|yyyymmddhh|"
-                       "yyyymmddhhmm");
+        return IsOneOf(
+            word, "date|time|datetime|timestamp|datum|zeit|zeitpunkt|uhrzeit|tijd|fecha|data|"
+                  "dato|heure|hora|dt|tm|tmstp|epoch|hhmm|yyyymm|yyyymmdd|yyyymmddhh|"
+                  "yyyymmddhhmm|clock|tijdstip|orario|時刻|時間|観測時刻|時分|日時|観測日時|日付|"
+                  "年月日|年月日時|年月");
     });
 }
 

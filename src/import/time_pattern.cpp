@@ -70,20 +70,22 @@ bool TakeHalfOfDay(TextCursor* cursor, TimeParts* parts) {
     return true;
 }
 
-bool TakeShortYear(TextCursor* cursor, TimeParts* parts) {
-    int digits = 0;
-    if (!TakeInt(cursor, 2, &digits))
+/// Of several years the first holds: a hydrological year "1999/00" is called after its start.
+bool TakeYear(TextCursor* cursor, int digits, TimeParts* parts) {
+    int year = 0;
+    if (!TakeInt(cursor, digits, &year))
         return false;
-    parts->year = YearOfTwoDigits(digits);
+    if (parts->year == TimeParts().year)
+        parts->year = digits == 2 ? YearOfTwoDigits(year) : year;
     return true;
 }
 
 bool TakeField(char letter, TextCursor* cursor, TimeParts* parts) {
     switch (letter) {
     case 'Y':
-        return TakeInt(cursor, 4, &parts->year);
+        return TakeYear(cursor, 4, parts);
     case 'y':
-        return TakeShortYear(cursor, parts);
+        return TakeYear(cursor, 2, parts);
     case 'm':
         return TakeInt(cursor, 2, &parts->month);
     case 'd':

@@ -10,8 +10,9 @@ namespace ryn {
 
 /// A time format as --time-format gives it: %Y %y %m %d %j %H %I %M %S %f %p %b %B %z %%, the short
 /// forms %F (%Y-%m-%d), %T (%H:%M:%S), %R (%H:%M), and plain characters. A blank stands for any
-/// run of blanks, also none. Numbers may lack leading zeros where a sign that is no digit follows.
-/// Independent of the locale; months' names are those of MonthOfName.
+/// run of blanks, also none. Of several years the first holds. Numbers may lack leading zeros where
+/// a sign that is no digit follows. Independent of the locale; months' names are those of
+/// MonthOfName.
 class TimePattern {
   public:
     /// False for an unknown letter behind %, and for a format without any field; *reason tells.

@@ -4,6 +4,7 @@
 
 #include "import/number_field.h"
 #include "import/table_text.h"
+#include "import/text_cursor.h"
 #include "import/time_names.h"
 #include "import/time_reader.h"
 
@@ -11,12 +12,24 @@ namespace ryn {
 
 namespace {
 
+/// Months written so would have to be January 2000, February 2001, ...: one alone may be a month,
+/// several are none.
+bool HoldsHydrologicalYears(const SampleRows& rows, std::size_t column) {
+    std::size_t years = 0;
+    std::size_t others = 0;
+    for (const auto& fields : rows.All())
+        if (!IsMissingWord(fields[column]))
+            (IsHydrologicalYear(fields[column]) ? years : others) += 1;
+    return years >= 2 && years >= 4 * others;
+}
+
 /// "2001-12" or, in digits alone, 200112.
 bool FindMonths(const TimeSearch& search, TimeLayout* time) {
     for (const std::size_t column : search.columns) {
         const bool isNumber = search.rows.Column(column).kind == ColumnKind::Number;
         // Discharges of six digits exist; months that rise from row to row do not come by chance.
-        if (isNumber && !search.rows.HasDigitsOnly(column, 6))
+        if ((isNumber && !search.rows.HasDigitsOnly(column, 6)) ||
+            HoldsHydrologicalYears(search.rows, column))
             continue;
         *time = DateLayout(column, isNumber ? DateForm::CompactYearMonth : DateForm::YearMonth);
         const TimeFit fit = FitTime(search.rows, *time);
@@ -117,6 +130,18 @@ bool FindElapsed(const TimeSearch& search, TimeLayout* time) {
 
 } // namespace
 
+bool IsHydrologicalYear(std::string_view field) {
+    TextCursor cursor(field);
+    int digits = 0;
+    const int first = cursor.TakeNumber(4, &digits);
+    if (digits != 4 || (cursor.Peek() != '/' && cursor.Peek() != '-'))
+        return false;
+    cursor.Skip();
+    const int second = cursor.TakeNumber(4, &digits);
+    return cursor.IsAtEnd() &&
+           ((digits == 2 && second == (first + 1) % 100) || (digits == 4 && second == first + 1));
+}
+
 /// The whole of the rows, since one that does not fit may decide between two forms.
 TimeFit FitTime(const SampleRows& rows, const TimeLayout& time) {
     TimeReader reader(time);
@@ -151,6 +176,14 @@ bool TimeSearch::IsUsable(std::size_t column, TimeRole role) const {
     probe.defaults.year = 2000; // a leap year, so that any month and day will do
     const TimeFit fit = FitTime(rows, probe);
     return fit.ok > 0.0 && fit.ok + fit.incomplete >= 0.9 * fit.Total();
+}
+
+std::optional<std::size_t> FindHydrologicalYears(const TimeSearch& search) {
+    const auto at =
+        std::find_if(search.columns.begin(), search.columns.end(), [&search](std::size_t column) {
+            return HoldsHydrologicalYears(search.rows, column);
+        });
+    return at == search.columns.end() ? std::nullopt : std::optional(*at);
 }
 
 bool FindOtherTime(const TimeSearch& search, TimeLayout* time) {

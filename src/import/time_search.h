@@ -1,8 +1,10 @@
 #pragma once
 
 #include <algorithm>
+#include <optional>
 #include <vector>
 
+#include "base/status.h"
 #include "import/sample_rows.h"
 #include "import/table_layout.h"
 
@@ -45,9 +47,15 @@ struct TimeSearch {
     bool IsUsable(std::size_t column, TimeRole role) const;
 };
 
-/// A column of whole dates (and clock times), with the column of clock times and that of zone names
-/// that go with it. False when there is none.
+/// A column of whole dates (and clock times). False when there is none.
 bool FindDateColumn(const TimeSearch& search, TimeLayout* time);
+
+/// The column of times of day that goes with the dates of the layout, where these have none; notes
+/// one that is empty too often. A fault for one that cannot be read.
+Status FindClockColumn(const TimeSearch& search, TableLayout* layout);
+
+/// A column of zone names ("EST", "EDT") beside the time.
+void FindZoneColumn(const TimeSearch& search, TimeLayout* time);
 
 /// What FindPartColumns came to.
 enum class PartsResult {
@@ -61,6 +69,11 @@ PartsResult FindPartColumns(const TimeSearch& search, TimeLayout* time);
 
 /// Year, month and day (and hour, minute, second) side by side without names, told by their values.
 bool FindUnnamedParts(const TimeSearch& search, TimeLayout* time);
+
+/// "1999/00", "1999-2000": a year and the one after it.
+bool IsHydrologicalYear(std::string_view field);
+/// The first column of years such as "1999/00", which are no months; several rows have to tell.
+std::optional<std::size_t> FindHydrologicalYears(const TimeSearch& search);
 
 /// A column of months, years, decimal years, or lengths of time.
 bool FindOtherTime(const TimeSearch& search, TimeLayout* time);

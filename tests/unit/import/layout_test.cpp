@@ -95,12 +95,12 @@ TEST(TableLayout, FindsDelimiterDecimalAndHeaderByItself) {
 TEST(TableLayout, PassesOverHeadersOfGaugeNetworks) {
     CheckAll({
         {"comments, names, and a line of types",
-         "# Data provided for site 01\n#    DD "
+         "#####\n### 2 sites, 2012 ###\n# Data provided for site 01\n#    DD "
          "parameter\n#\nagency_cd\tsite_no\tdatetime\tx_cd\tv\n"
          "5s\t15s\t20d\t10s\t14n\nUSGS\t02177000\t2012-09-01\tA\t191\n"
          "USGS\t02177000\t2012-09-02\tP\t213\n",
          "2012-09-01 191; 2012-09-02 213",
-         {"names in line 4", "rows from line 6", "item: \"v\""}},
+         {"names in line 6", "rows from line 8", "item: \"v\""}},
         {"names and units in comments, parts of the date in columns",
          "#YY  MM DD hh mm WDIR  WVHT\n#yr  mo dy hr mn degT     m\n2019 08 01 00 00 231  1.60\n"
          "2019 08 01 00 10 222  1.70\n",
@@ -170,6 +170,29 @@ TEST(TableLayout, JoinsDatesAndTimesThatStandInSeveralColumns) {
          "330,20010201,    1,   60\n",
          "2001-01-31 23:00:00 40; 2001-02-01 50; 2001-02-01 01:00:00 60",
          {"hour 24 is 00:00 of the next day", "item: \"FF\""}},
+        {"times of day in words, under their names",
+         "Datum;Uhrzeit;W\n31.1.2001;7h30;1\n31.1.2001;8 Uhr;2\n31.1.2001;9 Uhr 05;3\n"
+         "31.1.2001;12:45 Uhr;4\n",
+         "2001-01-31 07:30:00 1; 2001-01-31 08:00:00 2; 2001-01-31 09:05:00 3; "
+         "2001-01-31 12:45:00 4",
+         {"columns 1 \"Datum\", 2 \"Uhrzeit\""}},
+        {"hours with half of the day",
+         "date,time,q\n2001-01-31,6 am,1\n2001-01-31,12 pm,2\n2001-01-31,6 p.m.,3\n",
+         "2001-01-31 06:00:00 1; 2001-01-31 12:00:00 2; 2001-01-31 18:00:00 3",
+         {}},
+        {"digits and a word for hours, beside a date in parts",
+         "year,month,day,time,q\n2001,1,31,0730 hrs,1\n2001,1,31,1845 hrs,2\n",
+         "2001-01-31 07:30:00 1; 2001-01-31 18:45:00 2",
+         {}},
+        {"Japanese",
+         "年,月,日,時刻,水位\n2001,1,31,9時,1\n2001,1,31,9時30分,2\n2001,1,31,24時,3\n",
+         "2001-01-31 09:00:00 1; 2001-01-31 09:30:00 2; 2001-02-01 3",
+         {"item: \"水位\""}},
+        {"times of day that most rows lack",
+         "peak_dt,peak_tm,v\n2001-01-31,,1\n2001-02-01,12:30,2\n2001-02-03,,3\n",
+         "2001-01-31 1; 2001-02-01 2; 2001-02-03 3",
+         {"note: the times of day in column 2 \"peak_tm\" are not used: many rows have none, the "
+          "first in line 2"}},
         {"hour ending, and hours that are counted",
          "Date,Hour Ending,sunshine hours\n01/31/2001,23,1\n01/31/2001,24,0\n02/01/2001,1,1\n",
          "2001-01-31 23:00:00 1; 2001-02-01 0; 2001-02-01 01:00:00 1",
@@ -272,7 +295,10 @@ TEST(TableLayout, KnowsManyWaysToWriteATime) {
          "\xEF\xBB\xBFYear,SeaLevel\n1923,4.03\n1924,3.83\n",
          "1923-01-01 4.03; 1924-01-01 3.83",
          {"each value is placed at 1 January"}},
-        {"year and month in one", "m,v\n2001-11,1\n2001-12,2\n", "2001-11-01 1; 2001-12-01 2", {}},
+        {"year and month in one",
+         "m,v\n2000-01,1\n2000-02,2\n2001-02,3\n",
+         "2000-01-01 1; 2000-02-01 2; 2001-02-01 3",
+         {}},
         {"lengths of time",
          "time,U\n0 days 00:00:00,8.3\n0 days 00:10:00,11.5\n1 days 00:00:00,9\n",
          "0 8.3; 600 11.5; 86400 9",
@@ -289,7 +315,7 @@ TEST(TableLayout, KnowsManyWaysToWriteATime) {
     });
 }
 
-TEST(TableLayout, ReadsUtf16AsSpreadsheetsExportIt) {
+TEST(TableLayout, ReadsUtf16AndJapaneseEncodings) {
     const std::string ascii = "Zeit\tWert\r\n2001-01-01\t1,5\r\n2001-01-02\t2,5\r\n";
     std::string little = "\xFF\xFE";
     std::string bigWithoutMark;
@@ -302,6 +328,22 @@ TEST(TableLayout, ReadsUtf16AsSpreadsheetsExportIt) {
     EXPECT_EQ(Imported(little).Days(), "2001-01-01 1.5; 2001-01-02 2.5");
     EXPECT_EQ(Imported(bigWithoutMark).Days(), "2001-01-01 1.5; 2001-01-02 2.5");
     ExpectContains(Imported(little).Report(), "UTF-16LE");
+    // Shift_JIS, in which a character may end with a bar.
+    const Imported japanese("\x94N\x8C\x8E\x93\xFA|\x90\x85\x88\xCA(m)|\x94\xF5\x8Dl\n"
+                            "2001/01/30|1.5|\x83|\n"
+                            "2001/01/31|2|\x83\\\n");
+    EXPECT_EQ(japanese.Days(), "2001-01-30 1.5; 2001-01-31 2");
+    for (const char* part : {"Shift_JIS, 3 columns parted by bar", "item: \"水位\"", "unit m"})
+        ExpectContains(japanese.Report(), part);
+    ImportOptions options;
+    options.encoding = "EUC-JP";
+    EXPECT_EQ(Imported("\xC6\xFC,\xBF\xE5\xB0\xCC\n"
+                       "2001-01-30,5\n"
+                       "2001-01-31,6\n",
+                       options)
+                  .report.items[0]
+                  .name,
+              "水位");
 }
 
 TEST(TableLayout, ReadsQuotedFieldsWithDelimitersQuotesAndLineBreaks) {

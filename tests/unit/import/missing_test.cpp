@@ -17,8 +17,8 @@ std::string Daily(const std::vector<std::string>& values, const std::string& hea
     int day = 1;
     for (const std::string& value : values) {
         const std::string number = std::to_string(day++);
-        text +=
-            "2001-01-" + std::string(number.size() < 2 ? "0" : "") + number + "," + value + "\n";
+        text += number.size() < 2 ? "2001-01-0" : "2001-01-";
+        text.append(number).append(",").append(value).append("\n");
     }
     return text;
 }
@@ -32,36 +32,11 @@ std::string Kept(const Imported& imported) {
 }
 
 TEST(MissingValue, IsKnownByItsUsualWords) {
-    const Imported imported(Daily({"1",
-                                   "",
-                                   "NA",
-                                   "nan",
-                                   "NULL",
-                                   "-",
-                                   "--",
-                                   "***",
-                                   "ND",
-                                   "M",
-                                   "Ice",
-                                   "L\xC3\xBC"
-                                   "cke",
-                                   "l\xFC"
-                                   "cke",
-                                   "n/a",
-                                   ".",
-                                   "2",
-                                   "3",
-                                   "4",
-                                   "5",
-                                   "6",
-                                   "7",
-                                   "8",
-                                   "9",
-                                   "1.5",
-                                   "2.5",
-                                   "3.5",
-                                   "4.5",
-                                   "5.5"}));
+    const std::string latin = std::string("l\xFC") + "cke";
+    const Imported imported(
+        Daily({"1",   "",      "NA",  "nan", "NULL", "-",   "--",  "***", "ND", "M",
+               "Ice", "Lücke", latin, ".",   "2",    "3",   "4",   "5",   "6",  "7",
+               "8",   "9",     "n/a", "1.5", "2.5",  "3.5", "4.5", "5.5"}));
     EXPECT_EQ(Kept(imported), "1 2 3 4 5 6 7 8 9 1.5 2.5 3.5 4.5 5.5");
     ExpectContains(imported.Report(), "missing: empty, once");
     ExpectContains(imported.Report(), "missing: \"NULL\", once");
@@ -100,6 +75,14 @@ TEST(MissingValue, IsANumberOnlyWhereThatIsUnmistakable) {
          {"4.5", "-1.5", "5.5", "-1.5", "-1.5"},
          "4.5 -1.5 5.5 -1.5 -1.5",
          "rows read: 5"},
+        {"lone negative values of any look",
+         {"4", "-8.88", "5", "-9"},
+         "4 -8.88 5 -9",
+         "note: -8.88 occurs once"},
+        {"a code too short to be sure of",
+         {"4.5", "-99", "5.5"},
+         "4.5 -99 5.5",
+         "note: -99 occurs once"},
         {"nines far above",
          {"1.6", "99.0", "1.5", "99.00", "99", "2"},
          "1.6 1.5 2",

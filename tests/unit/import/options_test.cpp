@@ -75,6 +75,7 @@ TEST(ImportOption, TimeFormatDecidesWhatTheTableLeavesOpen) {
          "2000-01-01 12:00:00 1; 2000-01-02 01:00:00 2"},
         {"d,v\n946684800,1\n946684801.5,2\n", "unix", "2000-01-01 1; 2000-01-01 00:00:01.500 2"},
         {"d,v\n2000.5,1\n2001,2\n", "decimal-year", "2000-07-02 1; 2001-01-01 2"},
+        {"y,v\n1925/26,1\n1926/27,2\n", "%Y/%y", "1925-01-01 1; 1926-01-01 2"},
         {"d;v\nMi 01 mai 2001 2 PM;1\nDo 02 mai 2001 3 AM;2\n", "Mi %d %b %Y %I %p",
          "table.csv: no column reads as --time-format \"Mi %d %b %Y %I %p\"; name the column with "
          "--time"},

@@ -53,6 +53,30 @@ TEST(TableRefusal, NamesTheLineOfAValueThatIsNone) {
         {WithRow("2001-01-03,<0.5,0"),
          "line 4: \"<0.5\" in column 2 \"q\" is a bound and not a value; leave such rows out with "
          "--missing \"<\", or edit them"},
+        {WithRow("2001-01-03,########,0"),
+         "line 4: \"########\" in column 2 \"q\" is what a spreadsheet writes where a column is "
+         "too narrow; widen it and export again"},
+        {WithRow("########,3.5,0"),
+         "line 4: \"########\" in column 1 \"time\" is what a spreadsheet writes where a column is "
+         "too narrow; widen it and export again"},
+        {WithRow("########,########,########"),
+         "line 4: \"########\" in column 1 \"time\" is what a spreadsheet writes where a column is "
+         "too narrow; widen it and export again"},
+        {"d;q\n#####;1,5\n2001-01-02;2\n#####;3\n",
+         "line 2: \"#####\" in column 1 \"d\" is what a spreadsheet writes where a column is too "
+         "narrow; widen it and export again"},
+        {"d,q,t\n2001-01-01,####,1\n2001-01-02,####,2\n",
+         "line 2: \"####\" in column 2 \"q\" is what a spreadsheet writes where a column is too "
+         "narrow; widen it and export again"},
+        {"q\n####\n1.5\n2.5\n",
+         "line 2: \"####\" in column 1 \"q\" is what a spreadsheet writes where a column is too "
+         "narrow; widen it and export again",
+         [] {
+             ImportOptions options;
+             options.start = "1914-01-01";
+             options.step = "1d";
+             return options;
+         }()},
         {WithRow("2001-01-03"), "line 4: ends before column 2 \"q\"; if the value is missing there "
                                 "say --missing \"\""},
     });
@@ -76,6 +100,16 @@ TEST(TableRefusal, NamesTheLineOfATimeThatIsNone) {
          "line 3: \"2001-13-02\" is no time of the form year-month-day (2 rows cannot be read: "
          "lines 3, 5)"},
         {"year,q\n1901,3\n1902,4\n19031,5\n", "line 4: \"19031\" is no time of the form year"},
+        // One fault does not drop the times of day.
+        {"d,clock,q\n2001-01-01,12:30,1\n2001-01-01,24:30,2\n2001-01-02,13:30,3\n",
+         "line 3: \"2001-01-01 24:30\" is no time of the form year-month-day"},
+        {"d,Uhrzeit,q\n2001-01-01,noon,1\n2001-01-02,dusk,2\n",
+         "line 2: \"noon\" in column 2 \"Uhrzeit\" is no time of day; tell its form with --time "
+         "and "
+         "--time-format, or leave the times of day out by naming the date alone with --time"},
+        {"d,time,q\n2001-01-01,0.25,1\n2001-01-01,0.75,2\n",
+         "line 2: \"0.25\" in column 2 \"time\" is no time of day; tell its form with --time and "
+         "--time-format, or leave the times of day out by naming the date alone with --time"},
         // A faulty first row is no header.
         {"time,q\n2001-02-30,1\n2001-03-01,2\n2001-03-02,3\n2001-03-03,4\n2001-03-04,5\n",
          "line 2: \"2001-02-30\" is no time of the form year-month-day"},
@@ -119,6 +153,14 @@ TEST(TableRefusal, SaysWhatToGiveWhereTheTableLeavesItOpen) {
         {"d,v\n1/2/2001,1\n3/4/2001,2\n",
          "the dates may be day-month-year or month-day-year, and no row decides; tell which with "
          "--time-format, such as %d/%m/%Y or %m/%d/%Y"},
+        {"year,v\n1999/00,5\n2000/01,6\n2001/02,7\n",
+         "line 2: \"1999/00\" and the like in column 1 \"year\" are hydrological years, not "
+         "months; take the year in which each begins with --time-format %Y/%y (and its first day "
+         "with --start, such as 1999-10-01)"},
+        {"NA;4\n1960-1961;5\n1961-1962;6\n",
+         "line 2: \"1960-1961\" and the like in column 1 are hydrological years, not months; take "
+         "the year in which each begins with --time-format %Y-%Y (and its first day with --start, "
+         "such as 1999-10-01)"},
         {"d;v\n2001-01-01;147,000\n2001-01-02;152,500\n2001-01-03;160,250\n",
          "line 2: the comma in \"147,000\", column 2 \"v\", may part decimals or thousands; if it "
          "is "
@@ -243,6 +285,42 @@ TEST(TableRefusal, TellsStepsThatDoNotRise) {
     });
 }
 
+TEST(TableRefusal, RefusesSeveralSeriesInOneTable) {
+    const std::string rest = "; write a table for each (or take the column out where all are one "
+                             "series)";
+    ImportOptions sorted;
+    sorted.sort = true;
+    sorted.duplicates = "max";
+    CheckAll({
+        {"station,date,q\nA,2001-01-01,1\nA,2001-01-02,2\nB,2002-01-01,3\nB,2002-01-02,4\n",
+         "line 4: \"B\" in column 1 \"station\" is another series than \"A\" in line 2" + rest},
+        {"Datum;Messgröße;Wert\n1.1.2001 00:00;W;1\n1.1.2001 01:00;Q;2\n1.1.2001 02:00;W;3\n"
+         "1.1.2001 03:00;T;4\n13.1.2001 00:00;Q;2\n",
+         "line 3: \"Q\" in column 2 \"Messgröße\" is another series than \"W\" in line 2 (3 in "
+         "all)" +
+             rest},
+        {"観測所,d,q\nx,2001-01-01,1\n,2001-01-02,2\n"
+         "y,2002-01-01,3\n,2002-01-02,4\n",
+         "line 4: \"y\" in column 1 \"観測所\" is another "
+         "series than \"x\" in line 2" +
+             rest},
+        {"site_no,d,q\n11,2001-01-01,1\n11,2001-01-02,2\n12,2001-01-01,3\n12,2001-01-03,4\n",
+         "line 4: \"12\" in column 1 \"site_no\" is another series than \"11\" in line 2" + rest,
+         sorted},
+        {"Rees;2001-01-01;1.5\nRees;2001-01-02;2\nEmmerich;2001-02-01;3\nEmmerich;2001-02-02;4\n",
+         "line 3: \"Emmerich\" in column 1 is another series than \"Rees\" in line 1" + rest},
+    });
+    // Flags, constant names, row numbers and measurements of a place are no names of series.
+    for (const char* rows :
+         {"station,d,q,flag\nA,2001-01-01,1,e\nA,2001-01-02,2,e\nA,2001-01-03,3,g\n",
+          "d,q,quality code\n2001-01-01,1,10\n2001-01-02,2,10\n2001-01-03,3,20\n",
+          "2001-01-01,1,provisional\n2001-01-02,2,provisional\n2001-01-03,3,final\n",
+          "d,q,station pressure\n2001-01-01,1,10\n2001-01-02,2,10\n2001-01-03,3,11\n",
+          "id,d,q\nx1,2001-01-01,1\nx2,2001-01-02,2\nx3,2001-01-03,3\n",
+          "Mo,2001-01-01,1\nDi,2001-01-02,2\nMo,2001-01-03,3\n"})
+        EXPECT_EQ(Imported(rows).Days(), "2001-01-01 1; 2001-01-02 2; 2001-01-03 3") << rows;
+}
+
 TEST(TableRefusal, RefusesTwoTablesInOneFile) {
     std::string text = "t,v\n";
     for (int day = 10; day < 22; ++day)
@@ -359,7 +437,8 @@ TEST(ImportOption, IsRefusedWithWhatItMayBe) {
          "tab, bar, blank"},
         {&ImportOptions::decimal, ";", "--decimal \";\": \".\" or \",\""},
         {&ImportOptions::encoding, "ebcdic",
-         "--encoding \"ebcdic\": utf-8, latin-1, windows-1252, utf-16le or utf-16be"},
+         "--encoding \"ebcdic\": utf-8, latin-1, windows-1252, utf-16le, utf-16be, shift_jis or "
+         "euc-jp"},
         {&ImportOptions::start, "yesterday",
          "--start \"yesterday\": a date such as 1914-01-01 or \"1914-01-01 06:00\""},
         {&ImportOptions::step, "1d", "--step needs --start: the date of the first row"},

@@ -7,6 +7,7 @@
 #include "import/date_text.h"
 #include "import/line_reader.h"
 #include "import/number_field.h"
+#include "import/text_decoder.h"
 #include "import/unit_text.h"
 #include "unit/import/import_fixture.h"
 
@@ -35,17 +36,39 @@ TEST(LineReader, GivesTheSameLinesWhateverTheirEndsAndTheBlocks) {
 }
 
 TEST(TextEncoding, IsGuessedFromTheFirstBytes) {
-    EXPECT_EQ(GuessEncoding("plain"), TextEncoding::Utf8);
-    EXPECT_EQ(GuessEncoding("H\xC3\xB6he"), TextEncoding::Utf8);
-    EXPECT_EQ(GuessEncoding("cut \xE2\x88"), TextEncoding::Utf8);
-    EXPECT_EQ(GuessEncoding("H\xF6he"), TextEncoding::Windows1252);
-    EXPECT_EQ(GuessEncoding("\xC0\xAF"), TextEncoding::Windows1252);
+    struct Case {
+        const char* start;
+        TextEncoding encoding;
+    };
+    const Case cases[] = {
+        {"plain", TextEncoding::Utf8},
+        {"H\xC3\xB6he", TextEncoding::Utf8},
+        {"cut \xE2\x88", TextEncoding::Utf8},
+        {"H\xF6he", TextEncoding::Windows1252},
+        {"\xC0\xAF", TextEncoding::Windows1252},
+        {"M\xE4rz 20 \xB0\x43, m\xB3/s, \xC5ngstr\xF6m, gr\xF6\xDF\x65, \xE9",
+         TextEncoding::Windows1252},
+        {"it\x92s the \x93river\x92s\x94 level \x96 5 \x80", TextEncoding::Windows1252},
+        {"a\xE9\xE8\x62", TextEncoding::Windows1252},
+        {"\x94N,\x8C\x8E,\x93\xFA,\x92l", TextEncoding::ShiftJis},
+        {"\x90\x85\x88\xCA\x83\x66\x81[\x83^,\xBD\xB2\xB2", TextEncoding::ShiftJis},
+        {"\x97\xAC\x97\xCA\x95", TextEncoding::ShiftJis},
+        {"\xB4\xD1\xC2\xAC\xBD\xEA,\x8E\xBD\x8E\xB2\x8E\xB2,\xBF\xE5\xB0\xCC", TextEncoding::EucJp},
+    };
+    for (const Case& one : cases)
+        EXPECT_EQ(GuessEncoding(one.start), one.encoding) << one.start;
     EXPECT_EQ(ToUtf8("20 \x80, \xB0", TextEncoding::Windows1252), "20 \xE2\x82\xAC, \xC2\xB0");
     Utf16Decoder decoder(TextEncoding::Utf16LittleEndian);
     std::string text;
     for (const char byte : std::string("A\0\x3D\xD8\x00\xDE\x00\xDCz\0", 10))
         decoder.Decode(std::string_view(&byte, 1), &text); // byte by byte: nothing is lost at cuts
     EXPECT_EQ(text, "A\xF0\x9F\x98\x80\xEF\xBF\xBDz");
+    std::unique_ptr<TextDecoder> japanese;
+    ASSERT_TRUE(MakeDecoder(TextEncoding::ShiftJis, &japanese));
+    text.clear();
+    for (const char byte : std::string("\\|\x83|\xFF."))
+        japanese->Decode(std::string_view(&byte, 1), &text);
+    EXPECT_EQ(text, "\\|ポ\xEF\xBF\xBD.");
 }
 
 std::string MomentOf(const std::string& text, DateForm form) {
@@ -118,10 +141,7 @@ TEST(DateText, KnowsMonthsOfSevenLanguages) {
         {"Sep", "september", "septiembre", "settembre", "setembro"},
         {"Oct", "Okt", "oktober", "ottobre", "outubro"},
         {"Nov", "november"},
-        {"Dec", "Dez", "dezembro",
-         "d\xC3\xA9"
-         "cembre",
-         "diciembre", "dicembre"},
+        {"Dec", "Dez", "dezembro", "décembre", "diciembre", "dicembre"},
     };
     for (std::size_t i = 0; i < months.size(); ++i)
         for (const char* name : months[i])
