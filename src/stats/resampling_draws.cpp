@@ -1,0 +1,34 @@
+#include "stats/resampling_draws.h"
+
+#include <boost/math/special_functions/erf.hpp>
+
+#include <cmath>
+#include <numbers>
+
+namespace ryn::stats {
+
+namespace {
+
+double NormalQuantile(double u) {
+    return -std::numbers::sqrt2 * boost::math::erfc_inv(2 * u);
+}
+
+} // namespace
+
+std::size_t PoissonCount(double mean, double u) {
+    if (mean > 700) {
+        return static_cast<std::size_t>(mean + std::sqrt(mean) * NormalQuantile(u) + 0.5);
+    }
+    // u may exceed the sum of all terms by rounding; the limit on k lies far out in the tail.
+    std::size_t k = 0;
+    double term = std::exp(-mean);
+    double sum = term;
+    while (u > sum && static_cast<double>(k) < 10 * mean + 100) {
+        ++k;
+        term *= mean / static_cast<double>(k);
+        sum += term;
+    }
+    return k;
+}
+
+} // namespace ryn::stats
