@@ -11,6 +11,7 @@ namespace ryn::stats {
 
 namespace {
 
+// Every basis wants the order: ranks, or equal values side by side.
 std::vector<double> Sorted(const FitInput& input) {
     std::vector<double> sorted(input.values.begin(), input.values.end());
     if (input.order == ValueOrder::AsObserved) {
@@ -30,6 +31,8 @@ void AddDeletions(std::span<const double> sorted, const SeriesFrame& frame, Quan
     });
 }
 
+// What the estimator needs of the sample decides how a deletion is made; which family it is does
+// not matter here.
 void AddDeletions(const Combination& combination, std::span<const double> sorted,
                   const SeriesFrame& frame, QuantileTally& tally) {
     FitScratch scratch;
@@ -73,6 +76,7 @@ ResampledQuantiles Jackknife(const Combination& combination, const Distribution&
     if (n > 0) {
         AddDeletions(combination, Sorted(input), input.frame, tally);
     }
+    // ceil(0.9 n) in whole numbers.
     return tally.Results(n, (9 * n + 9) / 10, Summarise);
 }
 

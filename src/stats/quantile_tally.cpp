@@ -12,6 +12,7 @@ constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 
 } // namespace
 
+// West (1979): with a weight of 1 it is Welford's update, with w the same as w updates would be.
 void Spread::Add(double value, double weight) {
     if (!std::isfinite(value)) {
         return;
@@ -68,6 +69,7 @@ std::vector<ResampledQuantile> QuantileTally::Summarised(const std::vector<Entry
 
 ResampledQuantiles QuantileTally::Results(std::size_t asked, std::size_t needed,
                                           Summary summary) const {
+    // None needed of none asked for must not pass for enough.
     needed = std::max<std::size_t>(needed, 1);
     return {Summarised(atPeriods, needed, summary), Summarised(atProbabilities, needed, summary),
             asked, kept, needed};

@@ -16,6 +16,7 @@ std::vector<double> AscendingSample() {
                                                              rc::gen::inRange(0, 50));
     const double level = *rc::gen::element(0.0, -3.0, 1e6);
     std::vector<double> values;
+    values.reserve(steps.size());
     for (const int step : steps) {
         values.push_back(level + step / 8.0);
     }

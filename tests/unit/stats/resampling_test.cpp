@@ -163,6 +163,19 @@ TEST(MonteCarlo, LetsTheRateVaryWithTheCountAtPeriodsAlone) {
                 0.03);
 }
 
+// At rate T = 1.02 about half the samples are so small that there is no such event, at 1.3 one in
+// twenty.
+TEST(MonteCarlo, DropsASampleForTheShortPeriodsThatItLacks) {
+    const Subject subject("EXP1/MOM", "rain40");
+    const std::vector<double> periods{1.02 / subject.frame.rate, 1.3 / subject.frame.rate};
+    const auto result = subject.Simulated({periods});
+    EXPECT_EQ(result.kept, 1000U);
+    EXPECT_GT(result.atPeriods[0].estimate, 40);
+    EXPECT_TRUE(std::isnan(result.atPeriods[0].average));
+    EXPECT_GT(result.atPeriods[1].average, 40);
+    EXPECT_GT(result.atPeriods[1].standardDeviation, 0);
+}
+
 TEST(Resampling, GivesNoNumbersForAPeriodWithoutEvent) {
     const std::vector<double> periods{0.5, 1, -3, 0, std::nan(""), INFINITY, 10};
     for (const char* name : {"GUM/MOM", "EXP1/LMOM"}) {
@@ -198,6 +211,12 @@ TEST(Jackknife, HasNoNumbersForTheSmallestSample) {
     EXPECT_EQ(result.kept, 0U);
     EXPECT_TRUE(std::isfinite(result.atPeriods[0].estimate));
     EXPECT_TRUE(std::isnan(result.atPeriods[0].average));
+}
+
+// Half of all Poisson counts of mean 5 are below the five that a fit needs.
+TEST(MonteCarlo, DrawsNoSampleTooSmallToFit) {
+    const SeriesFrame frame{SeriesKind::PartialDuration, 0, 1};
+    EXPECT_EQ(Subject("EXP1/MOM", {1, 2, 4, 8, 16}, frame).Simulated({kPeriods}).kept, 1000U);
     EXPECT_EQ(Subject("GUM/MOM", {1, 2, 4, 8, 16}, {}).Simulated({kPeriods}).kept, 1000U);
 }
 
