@@ -93,16 +93,6 @@ Outcome<Estimate> ByLMoments(const Combination& c, const SeriesFrame& frame,
     }
 }
 
-Outcome<Estimate> ByLikelihood(const Combination& c, const FitInput& input) {
-    switch (c.distribution) {
-    case DistributionType::Exponential:
-        return AsEstimate(
-            ExponentialAbove(input.frame.threshold, CentralMomentsOf(input.values).mean));
-    default:
-        return kNotAvailable;
-    }
-}
-
 // The buffer keeps its memory between calls, so that only the first of many refits allocates.
 LMoments LMomentsOfInput(const FitInput& input, FitScratch& scratch) {
     if (input.order == ValueOrder::Ascending) {
@@ -115,20 +105,34 @@ LMoments LMomentsOfInput(const FitInput& input, FitScratch& scratch) {
 
 } // namespace
 
+// The exponential's likelihood asks for the mean alone.
+EstimationBasis BasisOf(const Combination& combination) {
+    switch (combination.method) {
+    case EstimationMethod::Moments:
+        return EstimationBasis::Moments;
+    case EstimationMethod::LMoments:
+        return EstimationBasis::LMoments;
+    case EstimationMethod::MaximumLikelihood:
+        break;
+    }
+    return combination.distribution == DistributionType::Exponential ? EstimationBasis::Moments
+                                                                     : EstimationBasis::Values;
+}
+
 Outcome<Estimate> EstimateParameters(const Combination& combination, const FitInput& input,
                                      FitScratch& scratch) {
     if (const auto refusal = Refusal(combination, input.frame.kind, input.values.size())) {
         return *refusal;
     }
-    switch (combination.method) {
-    case EstimationMethod::Moments:
+    switch (BasisOf(combination)) {
+    case EstimationBasis::Moments:
         return ByMoments(combination, input.frame, CentralMomentsOf(input.values), scratch);
-    case EstimationMethod::LMoments:
+    case EstimationBasis::LMoments:
         return ByLMoments(combination, input.frame, LMomentsOfInput(input, scratch));
-    case EstimationMethod::MaximumLikelihood:
+    case EstimationBasis::Values:
         break;
     }
-    return ByLikelihood(combination, input);
+    return kNotAvailable;
 }
 
 Outcome<Estimate> EstimateFromMoments(const Combination& combination, const SeriesFrame& frame,
@@ -136,7 +140,7 @@ Outcome<Estimate> EstimateFromMoments(const Combination& combination, const Seri
     if (const auto refusal = Refusal(combination, frame.kind, moments.count)) {
         return *refusal;
     }
-    if (combination.method != EstimationMethod::Moments) {
+    if (BasisOf(combination) != EstimationBasis::Moments) {
         return FitFailure{FitFault::MethodNotOffered};
     }
     return ByMoments(combination, frame, moments, scratch);
@@ -147,7 +151,7 @@ Outcome<Estimate> EstimateFromLMoments(const Combination& combination, const Ser
     if (const auto refusal = Refusal(combination, frame.kind, moments.count)) {
         return *refusal;
     }
-    if (combination.method != EstimationMethod::LMoments) {
+    if (BasisOf(combination) != EstimationBasis::LMoments) {
         return FitFailure{FitFault::MethodNotOffered};
     }
     return ByLMoments(combination, frame, moments);

@@ -34,6 +34,12 @@ struct FitScratch {
     GumbelConstants gumbel;
 };
 
+/// What an estimator needs to know of a sample. Moments and L-moments follow the deletion of a
+/// value in closed form, so that the jackknife need not go through the sample again.
+enum class EstimationBasis { Moments, LMoments, Values };
+
+EstimationBasis BasisOf(const Combination& combination);
+
 /// Estimates the parameters and checks nothing but the parameters: the step that resampling
 /// repeats, since there an estimate that leaves values outside its support still counts.
 /// Failures: DistributionNotOffered, MethodNotOffered, NotAvailable, TooFewValues, those of the
@@ -41,12 +47,12 @@ struct FitScratch {
 Outcome<Estimate> EstimateParameters(const Combination& combination, const FitInput& input,
                                      FitScratch& scratch);
 
-/// The same for the method of moments from moments that the caller has, as when a value is deleted
-/// from the sums in closed form. Fails as MethodNotOffered for another method.
+/// The same from moments that the caller has, as when a value is deleted from the sums in closed
+/// form. Fails as MethodNotOffered for a combination with another basis.
 Outcome<Estimate> EstimateFromMoments(const Combination& combination, const SeriesFrame& frame,
                                       const CentralMoments& moments, FitScratch& scratch);
 
-/// The same for the method of L-moments.
+/// The same from L-moments.
 Outcome<Estimate> EstimateFromLMoments(const Combination& combination, const SeriesFrame& frame,
                                        const LMoments& moments);
 

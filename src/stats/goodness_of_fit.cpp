@@ -13,6 +13,8 @@ namespace {
 
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 
+// Many classes see fine differences and few have the counts that the limit distribution needs:
+// Moore's growth with n^0.4, five values a class, and at least one degree of freedom.
 std::size_t ClassCount(std::size_t count, std::size_t parameterCount) {
     const auto byMoore =
         static_cast<std::size_t>(std::ceil(2 * std::pow(static_cast<double>(count), 0.4)));
@@ -73,6 +75,7 @@ ChiSquaredTest ChiSquaredTestOf(const Distribution& d, std::span<const double> v
         c.contribution = difference * difference / test.expected;
         test.statistic += c.contribution;
     }
+    // With less than one value expected in a class the limit distribution says nothing.
     if (values.size() < k) {
         test.statistic = kNaN;
     }
@@ -97,6 +100,7 @@ KolmogorovSmirnovTest KolmogorovSmirnovTestOf(const Distribution& d,
             test = {step.distance, 0, i + 1, sorted[i], f, step.empirical};
         }
     }
+    // Stephens (1970): so modified, D has the limit distribution for all n from about five.
     const double root = std::sqrt(n);
     test.level = 100 * KolmogorovSurvival((root + 0.12 + 0.11 / root) * test.statistic);
     return test;
@@ -105,6 +109,7 @@ KolmogorovSmirnovTest KolmogorovSmirnovTestOf(const Distribution& d,
 // Two forms of the same function: the alternating sum converges fast for large x, its transform by
 // Jacobi's theta function for small x. At 1.18 either is exact with four terms.
 double KolmogorovSurvival(double x) {
+    // sum exp(-j^2 pi^2/(8 x^2)) over odd j, and 2 sum (-1)^(j-1) exp(-2 j^2 x^2).
     // Below, the result is 1 to the last digit and pi/x might overflow.
     if (x < 0.05) {
         return 1;

@@ -37,6 +37,8 @@ double IntervalOf(double x, double start, double step) {
     return std::floor((x - start) / step + kHair);
 }
 
+// A threshold is the natural start, since no peak lies below it; but it may be a number from
+// another world than the values, and memory for the intervals between must not be asked for.
 double StartFor(double smallest, double largest, double step, const SeriesFrame& frame) {
     if (frame.kind == SeriesKind::PartialDuration &&
         IntervalOf(largest, frame.threshold, step) < kMostIntervals) {
@@ -45,6 +47,8 @@ double StartFor(double smallest, double largest, double step, const SeriesFrame&
     return step * IntervalOf(smallest, 0, step);
 }
 
+// Rounding may put the largest value one interval too high, and a peak may fall short of the
+// threshold by its own rounding.
 void Count(std::span<const double> values, Histogram& histogram) {
     const auto last = static_cast<double>(histogram.counts.size() - 1);
     for (const double x : values) {
@@ -93,6 +97,7 @@ std::optional<Histogram> HistogramOf(std::span<const double> values, const Serie
     if (!(histogram.step >= std::numeric_limits<double>::min())) {
         return std::nullopt;
     }
+    // A start or an interval that overflowed leaves nothing to draw.
     histogram.start = StartFor(*smallest, *largest, histogram.step, frame);
     const double last = std::max(0.0, IntervalOf(*largest, histogram.start, histogram.step));
     if (!std::isfinite(histogram.start) || !(last < kMostIntervals)) {
@@ -119,6 +124,7 @@ std::vector<double> IntervalDensities(const Distribution& d, const Histogram& hi
 std::vector<double> DensityCurveAbscissae(const Histogram& histogram, SeriesKind kind) {
     constexpr std::size_t kIntervals = 200;
     const auto count = static_cast<double>(histogram.counts.size());
+    // No density lies before the threshold; before the start of annual maxima there may be some.
     const double before = kind == SeriesKind::PartialDuration ? 0 : 1;
     const double first = histogram.start - before * histogram.step;
     const double width = (count + 1 + before) * histogram.step;

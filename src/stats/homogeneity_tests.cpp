@@ -13,6 +13,7 @@ namespace ryn::stats {
 
 namespace {
 
+// 2 (1 - Phi(|z|)) without the difference, which would be 0 from |z| = 8.3 on.
 TestScore Scored(double z) {
     return {TestObstacle::None, z, std::erfc(std::abs(z) / std::numbers::sqrt2)};
 }
@@ -32,6 +33,7 @@ TestScore ScoredWithCorrection(double difference, double correction, double vari
     return Scored(corrected / std::sqrt(variance));
 }
 
+// Of two middle values the midpoint without overflow.
 double Median(std::span<const double> values) {
     if (values.empty()) {
         return 0;
@@ -42,6 +44,7 @@ double Median(std::span<const double> values) {
     return sorted.size() % 2 == 1 ? sorted[half] : std::midpoint(sorted[half - 1], sorted[half]);
 }
 
+// Values at the median are on neither side and end no run (Bradley 1968).
 void CountRuns(std::span<const double> values, RunTest& test) {
     int side = 0;
     for (const double x : values) {
@@ -160,6 +163,8 @@ RunTest RunTestOf(std::span<const double> values) {
         test.score = NotMade(TestObstacle::TooFewBesideMedian);
         return test;
     }
+    // Mean and variance of R where every order of the sides is as likely (Wald and Wolfowitz
+    // 1940); divided step by step, since the product of four counts would lose digits.
     const auto n = static_cast<double>(test.above + test.below);
     const double twice = 2 * static_cast<double>(test.above) * static_cast<double>(test.below);
     test.expectedRuns = 1 + twice / n;
@@ -174,6 +179,7 @@ TrendTest TrendTestOf(std::span<const double> values) {
     const std::int64_t falling = SortCountingFallingPairs(sorted);
     TrendTest test;
     test.s = Pairs(sorted.size()) - 2 * falling;
+    // Kendall (1975): each group of t tied values takes away what a sample of t would have.
     const auto term = [](double t) { return t * (t - 1) * (2 * t + 5); };
     double ties = 0;
     ForEachEqualRun(sorted, [&](std::size_t, std::size_t count) {
@@ -197,6 +203,7 @@ ShiftTest ShiftTestOf(std::span<const double> values, std::span<const int> sampl
     const auto n1 = static_cast<double>(test.first);
     const auto n2 = static_cast<double>(test.second);
     const double n = n1 + n2;
+    // Tied values have equal ranks, which spread less: the last term is what that takes away.
     test.rankSum = RankSum(parted);
     test.u = test.rankSum - n1 * (n1 + 1) / 2;
     test.variance = n1 * n2 / 12 * (n + 1 - TieTerm(parted.both) / n / (n - 1));

@@ -9,11 +9,16 @@
 
 namespace ryn::stats {
 
+/// The size of the samples drawn for a partial duration series: it varies as the number of events
+/// in a record does, or is that of the full sample. For annual maxima it is always the latter.
+enum class EventCount { Poisson, Fixed };
+
 /// The results depend on these alone: each call begins the sequence anew, so that neither the other
 /// combinations nor the number of workers shows in them.
 struct MonteCarloSettings {
     std::size_t samples = 1000; ///< B
     std::uint64_t seed = 12345;
+    EventCount events = EventCount::Poisson;
 };
 
 /// What samples are drawn from and how they are fitted.

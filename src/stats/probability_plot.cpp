@@ -38,6 +38,7 @@ double Correlation(std::span<const double> x, std::span<const double> y) {
     return std::isfinite(r) && std::isfinite(xx + yy) ? std::clamp(r, -1.0, 1.0) : kNaN;
 }
 
+// s of the quantile and not of the probability: families define s by x alone.
 template <Family D>
 double MeanSquaredDifference(const D& d, const ProbabilityPlot& plot) {
     double sum = 0;
@@ -71,6 +72,7 @@ LeastSquaresCriterion LeastSquaresCriterionOf(const Distribution& d, const Proba
     result.highVariate = StandardVariate(d, Quantile(d, 0.99));
     const double squared =
         std::visit([&](const auto& family) { return MeanSquaredDifference(family, plot); }, d);
+    // Infinite variates cancel to NaN or stay infinite; neither is a criterion.
     const double criterion = std::sqrt(squared) / std::abs(result.highVariate - result.lowVariate);
     result.criterion = std::isfinite(criterion) ? criterion : kNaN;
     return result;
@@ -81,6 +83,7 @@ double PlotCorrelation(const ProbabilityPlot& plot) {
 }
 
 double ReducedPlotCorrelation(const Distribution& d, const ProbabilityPlot& plot) {
+    // u(x) is the model's own formula: through F it would lose the upper tail.
     std::vector<double> observed;
     std::vector<double> expected;
     std::visit(

@@ -25,6 +25,7 @@ double TopExceedance(const CurveRange& range) {
 std::vector<double> QuantileCurveProbabilities(const CurveRange& range) {
     constexpr std::size_t kCount = 100;
     const double low = std::min(0.01, 0.25 / static_cast<double>(range.count));
+    // Equidistant where the Gumbel paper is: both tails get their share of the points.
     const double yLow = -std::log(-std::log(low));
     const double yHigh = -std::log(-std::log1p(-TopExceedance(range)));
     std::vector<double> probabilities;

@@ -11,9 +11,9 @@ namespace ryn::stats {
 
 /// The quantiles whose uncertainty is asked for, all evaluated in one pass over the resamples.
 struct QuantileRequests {
-    std::span<const double> periods; ///< return periods in years; stay the caller's
+    std::span<const double> periods = {}; ///< return periods in years; stay the caller's
     PeriodMeaning meaning = PeriodMeaning::OfEvent;
-    std::span<const double> probabilities; ///< non-exceedance F of an event; stay the caller's
+    std::span<const double> probabilities = {}; ///< non-exceedance F of an event; stay the caller's
 };
 
 /// One of them. All but the estimate are NaN where too few resamples have this quantile; all are

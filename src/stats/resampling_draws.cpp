@@ -9,6 +9,9 @@ namespace ryn::stats {
 
 namespace {
 
+// exp(-mean) is still a normal double here, and the sum starts with all its digits.
+constexpr double kMostByInversion = 700;
+
 double NormalQuantile(double u) {
     return -std::numbers::sqrt2 * boost::math::erfc_inv(2 * u);
 }
@@ -16,8 +19,9 @@ double NormalQuantile(double u) {
 } // namespace
 
 std::size_t PoissonCount(double mean, double u) {
-    if (mean > 700) {
-        return static_cast<std::size_t>(mean + std::sqrt(mean) * NormalQuantile(u) + 0.5);
+    if (mean > kMostByInversion) {
+        return static_cast<std::size_t>(
+            std::floor(mean + std::sqrt(mean) * NormalQuantile(u) + 0.5));
     }
     // u may exceed the sum of all terms by rounding; the limit on k lies far out in the tail.
     std::size_t k = 0;

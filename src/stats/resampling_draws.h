@@ -22,7 +22,8 @@ class UniformDraws {
 
 /// The number of events with Poisson distribution of mean `mean` that belongs to the uniform number
 /// `u` in (0, 1), by inversion: of the distribution function up to a mean of 700, of its normal
-/// approximation beyond, where exp(-mean) comes near the smallest double.
+/// approximation beyond, where exp(-mean) comes near the smallest double. Part of the results like
+/// the generator: another method would draw other samples.
 std::size_t PoissonCount(double mean, double u);
 
 } // namespace ryn::stats

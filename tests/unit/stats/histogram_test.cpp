@@ -60,6 +60,7 @@ RC_GTEST_PROP(Histogram, HoldsEveryValueInAFewIntervals, ()) {
         *rc::gen::nonEmpty(rc::gen::container<std::vector<int>>(rc::gen::inRange(-1000, 1000)));
     const double unit = std::pow(10, *rc::gen::inRange(-300, 300));
     std::vector<double> values;
+    values.reserve(mantissas.size());
     for (const int mantissa : mantissas) {
         values.push_back(mantissa * unit);
     }
