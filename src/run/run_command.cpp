@@ -13,13 +13,12 @@ namespace ryn {
 
 namespace {
 
-enum EngineStatus : std::int32_t {
-    kStatusFailed = 1, ///< this series cannot be analysed
-    kStatusFatal = 3,  ///< the set-up cannot be used for any series
-};
+constexpr auto kSeriesFailed = static_cast<std::int32_t>(EngineStatus::SeriesFailed);
 
+/// Every other value is a success, those that no engine gives included.
 bool IsFailure(std::int32_t status) {
-    return status == kStatusFailed || status == kStatusFatal;
+    return status == kSeriesFailed ||
+           status == static_cast<std::int32_t>(EngineStatus::SetUpFailed);
 }
 
 /// One run, from the check to the written results.
@@ -114,12 +113,12 @@ void Run::CallEngine() {
         ports.messages->Show(MessageKind::Error, reason);
         outcome.reason = Status::InputFault(std::move(reason));
         busy.Restore();
-        status = kStatusFailed; // nothing valid to hand to the engine
+        status = kSeriesFailed; // nothing valid to hand to the engine
     } else {
         output = kvfCreate();
         busy.Restore();
         const CurrentDirectoryScope directory(SplitPath(document.GetPathName()).directory);
-        engine(input, output, status);
+        engine(&input, &output, &status);
     }
     kvfClose(&input);
     outcome.engineStatus = status;

@@ -5,12 +5,13 @@
 
 #include "base/status.h"
 #include "document/ryn_edit_doc.h"
+#include "engine/rynengine.h"
 
 namespace ryn {
 
 /// An analysis engine: takes the tree of a saved parameter file and an empty tree, to which it adds
 /// the target RYNoutput, and sets the status.
-using AnalysisEngine = void (*)(KvfHandle& input, KvfHandle& output, std::int32_t& status);
+using AnalysisEngine = void (*)(const KvfHandle* input, KvfHandle* output, std::int32_t* status);
 
 /// How the Run command ended.
 enum class RunEnd {
@@ -37,7 +38,7 @@ struct RunOutcome {
 ///
 /// The results in memory are gone from before the engine starts, so that a failed run leaves none.
 /// The modified flag is not touched after the save.
-RunOutcome RunAnalysis(CRynEditDoc& document, AnalysisEngine engine);
+RunOutcome RunAnalysis(CRynEditDoc& document, AnalysisEngine engine = RYNENGINE);
 
 /// The engine's log beside a result file.
 std::string LogFileOf(const std::string& resultFile);

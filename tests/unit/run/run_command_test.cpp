@@ -40,15 +40,15 @@ struct EngineDouble {
     const CRynEditDoc* document = nullptr;
 } engineDouble;
 
-void CallDouble(KvfHandle& input, KvfHandle& output, std::int32_t& status) {
+void CallDouble(const KvfHandle* input, KvfHandle* output, std::int32_t* status) {
     ++engineDouble.calls;
-    engineDouble.statusBefore = status;
-    engineDouble.input = kvfText(input.get());
+    engineDouble.statusBefore = *status;
+    engineDouble.input = kvfText(input->get());
     engineDouble.directory = std::filesystem::current_path();
     engineDouble.resultsWereThere =
         const_cast<CRynEditDoc*>(engineDouble.document)->Results().IsValid();
-    output = kvfLoadText(kSampleOutput, "engine");
-    status = engineDouble.status;
+    *output = kvfLoadText(kSampleOutput, "engine");
+    *status = engineDouble.status;
 }
 
 /// An analysis of a series of five years, with its result file.

@@ -1,0 +1,163 @@
+#include "engine/goodness_report.h"
+
+#include "engine/input_summary.h"
+#include "engine/plain_text.h"
+#include "engine/report_parts.h"
+#include "engine/report_text.h"
+
+namespace ryn {
+
+namespace {
+
+void AppendStatistics(std::string& text, const stats::SampleStatistics& statistics) {
+    AppendHeading(text, "Sample statistics", '-');
+    text +=
+        "Skewness and kurtosis are the estimators that are unbiased for normal samples (kurtosis"
+        " 3).\n\n";
+    AppendValue(text, "Number of values", std::to_string(statistics.count));
+    AppendValue(text, "Mean", SixDigits(statistics.mean));
+    AppendValue(text, "Variance", SixDigits(statistics.variance));
+    AppendValue(text, "Skewness", SixDigits(statistics.skewness));
+    AppendValue(text, "Kurtosis", SixDigits(statistics.kurtosis));
+    AppendValue(text, "Weighted moment b0", SixDigits(statistics.weighted.b0));
+    AppendValue(text, "Weighted moment b1", SixDigits(statistics.weighted.b1));
+    AppendValue(text, "Weighted moment b2", SixDigits(statistics.weighted.b2));
+    AppendValue(text, "Weighted moment b3", SixDigits(statistics.weighted.b3));
+    AppendValue(text, "L-moment l1", SixDigits(statistics.l1));
+    AppendValue(text, "L-moment l2", SixDigits(statistics.l2));
+    AppendValue(text, "L-skewness", SixDigits(statistics.lSkewness));
+    AppendValue(text, "L-kurtosis", SixDigits(statistics.lKurtosis));
+}
+
+void AppendScore(std::string& text, const stats::TestScore& score) {
+    if (!score.IsMade()) {
+        text += "  Not made: " + std::string(stats::TestObstacleText(score.obstacle)) + ".\n";
+        return;
+    }
+    AppendValue(text, "z", SixDigits(score.z));
+    AppendValue(text, "Significance level [%]", SixDigits(100 * score.level));
+}
+
+void AppendTests(std::string& text, const SeriesResults& series) {
+    if (!series.run && !series.trend && !series.shift)
+        return;
+    AppendHeading(text, "Independence and homogeneity", '-');
+    text += "z is standard normal for an independent, homogeneous series; levels are two-sided.\n";
+    if (series.run) {
+        text += "\nRun test: z < 0 means too few runs, as a trend or persistence makes them\n";
+        AppendValue(text, "Runs", std::to_string(series.run->runs));
+        AppendValue(text, "Values above the median", std::to_string(series.run->above));
+        AppendValue(text, "Values below the median", std::to_string(series.run->below));
+        AppendScore(text, series.run->score);
+    }
+    if (series.trend) {
+        text += "\nTest for trend (Mann-Kendall): z > 0 means rising\n";
+        AppendValue(text, "S", std::to_string(series.trend->s));
+        AppendValue(text, "Variance of S", SixDigits(series.trend->variance));
+        AppendScore(text, series.trend->score);
+    }
+    if (series.shift) {
+        text += "\nTest for shift in mean (rank sums): z > 0 means that subsample 1 is higher\n";
+        AppendValue(text, "Values in subsample 1", std::to_string(series.shift->first));
+        AppendValue(text, "Values in subsample 2", std::to_string(series.shift->second));
+        AppendValue(text, "Rank sum of subsample 1", SixDigits(series.shift->rankSum));
+        AppendScore(text, series.shift->score);
+    }
+}
+
+void AppendChiSquared(std::string& text, const stats::ChiSquaredTest& test) {
+    text += "\nChi-squared test, classes of equal probability\n";
+    AppendRow(text,
+              {"class", "lower bound", "upper bound", "observed", "expected", "contribution"});
+    for (std::size_t j = 0; j < test.classes.size(); ++j) {
+        const stats::ChiSquaredClass& c = test.classes[j];
+        AppendRow(text, {std::to_string(j + 1), SixDigits(c.lower), SixDigits(c.upper),
+                         std::to_string(c.observed), SixDigits(test.expected),
+                         SixDigits(c.contribution)});
+    }
+    AppendValue(text, "Statistic", SixDigits(test.statistic));
+    AppendValue(text, "Degrees of freedom", std::to_string(test.degreesOfFreedom));
+    AppendValue(text, "Level [%]", SixDigits(test.level));
+}
+
+void AppendKolmogorovSmirnov(std::string& text, const stats::KolmogorovSmirnovTest& test) {
+    text += "\nKolmogorov-Smirnov test\n";
+    AppendValue(text, "D", SixDigits(test.statistic));
+    AppendValue(text, "at the value", SixDigits(test.at));
+    AppendValue(text, "of ascending rank", std::to_string(test.rank));
+    AppendValue(text, "F there", SixDigits(test.cdf));
+    AppendValue(text, "Sample's share there", SixDigits(test.empirical));
+    AppendValue(text, "Level [%]", SixDigits(test.level));
+}
+
+void AppendPlotMeasures(std::string& text, const FitMeasureRequests& asked,
+                        const FitMeasures& found) {
+    if (asked.leastSquares) {
+        text += "\nStandard least squares criterion: about 0.02 is good, above 0.04 poor\n";
+        AppendValue(text, "SLSC", SixDigits(found.leastSquares.criterion));
+        AppendValue(text, "Standard variate of 0.01", SixDigits(found.leastSquares.lowVariate));
+        AppendValue(text, "Standard variate of 0.99", SixDigits(found.leastSquares.highVariate));
+    }
+    if (!asked.correlation && !asked.reducedCorrelation)
+        return;
+    text += "\nProbability plot correlation coefficient\n";
+    if (asked.correlation)
+        AppendValue(text, "I (values)", SixDigits(found.correlation));
+    if (asked.reducedCorrelation)
+        AppendValue(text, "II (reduced variates)", SixDigits(found.reducedCorrelation));
+}
+
+void AppendMeasures(std::string& text, const FitMeasureRequests& asked,
+                    const CombinationResults& results) {
+    const FitMeasures& found = results.measures;
+    if (asked.chiSquared)
+        AppendChiSquared(text, found.chiSquared);
+    if (asked.kolmogorovSmirnov)
+        AppendKolmogorovSmirnov(text, found.kolmogorovSmirnov);
+    AppendPlotMeasures(text, asked, found);
+    if (!asked.logLikelihood)
+        return;
+    text += "\nLikelihood\n";
+    AppendValue(text, "Log-likelihood", SixDigits(found.logLikelihood));
+    AppendValue(text, "Akaike's criterion", SixDigits(stats::AkaikeCriterion(*results.fit)));
+}
+
+void AppendPlot(std::string& text, const stats::Distribution& fitted,
+                const stats::ProbabilityPlot& plot) {
+    text +=
+        "\nObservations x and fitted quantiles; p is the plotting position, as non-exceedance\n";
+    AppendRow(text, {"rank", "x", "p", "F(x)", "quantile of p", "difference"});
+    for (std::size_t i = 0; i < plot.observed.size(); ++i) {
+        const double x = plot.observed[i];
+        AppendRow(text, {std::to_string(i + 1), SixDigits(x), SixDigits(plot.positions[i]),
+                         SixDigits(stats::Cdf(fitted, x)), SixDigits(plot.quantiles[i]),
+                         SixDigits(x - plot.quantiles[i])});
+    }
+}
+
+} // namespace
+
+std::string GoodnessReportHead(const EngineInput& input, const SeriesResults& series) {
+    std::string text = ReportHead(kGoodnessReportSubject, input);
+    const std::string unit = PlainName(input.labels.unit);
+    text +=
+        "Values, bounds and quantiles are in " + (unit.empty() ? "the series' unit" : unit) +
+        ".\n\nThe levels of the chi-squared and Kolmogorov-Smirnov tests take the parameters as "
+        "known.\nThey were fitted to the same values, so that the levels are too high.\n";
+    AppendStatistics(text, series.statistics);
+    AppendTests(text, series);
+    return text;
+}
+
+std::string GoodnessReportOf(const EngineInput& input, std::size_t index,
+                             const CombinationAnalysis& analysis) {
+    const CombinationResults& results = analysis.results;
+    std::string text = CombinationHead(input, index, results);
+    if (!results.fit)
+        return text;
+    AppendMeasures(text, input.measures, results);
+    AppendPlot(text, results.fit->distribution, analysis.plot);
+    return text;
+}
+
+} // namespace ryn

@@ -1,0 +1,54 @@
+#include "engine/plain_text.h"
+
+#include <cstddef>
+
+#include "kvf/characters.h"
+
+namespace ryn {
+
+namespace {
+
+// The codes U+0080 to U+009F hold a second set of control characters, next line among them; U+2028
+// and U+2029 part lines and paragraphs.
+bool BreaksLine(std::string_view character) {
+    if (character.size() == 1)
+        return KvfIsControl(character.front());
+    if (character.size() == 2)
+        return character[0] == '\xC2' && static_cast<unsigned char>(character[1]) < 0xA0;
+    return character == "\xE2\x80\xA8" || character == "\xE2\x80\xA9";
+}
+
+} // namespace
+
+std::string PlainText(std::string_view text) {
+    std::string line;
+    line.reserve(text.size());
+    for (std::size_t position = 0; position < text.size();) {
+        const std::size_t length = KvfUtf8Length(text, position);
+        const std::string_view character = text.substr(position, length);
+        if (length == 0)
+            line += '?';
+        else if (BreaksLine(character))
+            line += ' ';
+        else
+            line += character;
+        position += length == 0 ? 1 : length;
+    }
+    return line;
+}
+
+std::string PlainName(std::string_view name) {
+    constexpr std::size_t kLongest = 160;
+    if (name.size() <= kLongest)
+        return PlainText(name);
+    std::size_t end = 0;
+    while (true) {
+        const std::size_t length = KvfUtf8Length(name, end);
+        const std::size_t next = end + (length == 0 ? 1 : length);
+        if (next > kLongest)
+            return PlainText(name.substr(0, end)) + "...";
+        end = next;
+    }
+}
+
+} // namespace ryn

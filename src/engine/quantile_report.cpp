@@ -1,0 +1,75 @@
+#include "engine/quantile_report.h"
+
+#include "base/number_text.h"
+#include "engine/plain_text.h"
+#include "engine/report_parts.h"
+#include "engine/report_text.h"
+
+namespace ryn {
+
+namespace {
+
+std::string_view MethodNotes(UncertaintyMethod method) {
+    switch (method) {
+    case UncertaintyMethod::MonteCarlo:
+        return "average, bias and deviation: mean of the quantiles of samples drawn from the "
+               "fitted\n"
+               "distribution and fitted in the same way, its difference from the estimate, and "
+               "their\n"
+               "standard deviation. They take the distribution as the right one.\n";
+    case UncertaintyMethod::Jackknife:
+        return "average, bias and deviation: the jackknife estimate n est - (n-1) bar, the bias\n"
+               "(n-1) (bar - est) and the standard error, bar being the mean of the n quantiles "
+               "with\n"
+               "one value left out and est the estimate.\n";
+    case UncertaintyMethod::None:
+        break;
+    }
+    return "No averages and deviations were asked for.\n";
+}
+
+void AppendQuantile(std::string& text, double period, double exceedance,
+                    const stats::ResampledQuantile& quantile) {
+    constexpr double kNormal95 = 1.96; // half width of the central 95 % in standard deviations
+    const double margin = kNormal95 * quantile.standardDeviation;
+    AppendRow(text, {ShortestText(period), SixDigits(exceedance), SixDigits(quantile.estimate),
+                     SixDigits(quantile.average), SixDigits(quantile.bias),
+                     SixDigits(quantile.standardDeviation), SixDigits(quantile.estimate - margin),
+                     SixDigits(quantile.estimate + margin)});
+}
+
+void AppendResamples(std::string& text, UncertaintyMethod method,
+                     const stats::ResampledQuantiles& quantiles) {
+    if (method == UncertaintyMethod::None)
+        return;
+    text += "\nResamples that could not be fitted: " + std::to_string(quantiles.Failed()) + " of " +
+            std::to_string(quantiles.asked) + "\n";
+}
+
+} // namespace
+
+std::string QuantileReportHead(const EngineInput& input) {
+    const std::string unit = PlainName(input.labels.unit);
+    return ReportHead(kQuantileReportSubject, input) + "Events are in " +
+           (unit.empty() ? "the series' unit" : unit) + ", T in years; e is the probability that " +
+           (input.frame.kind == stats::SeriesKind::AnnualMaximum ? "the maximum of a year"
+                                                                 : "a peak above the threshold") +
+           "\nexceeds the T-year event.\n\n" + std::string(MethodNotes(input.uncertainty)) +
+           "lower and upper: estimate -+ 1.96 deviations, some 95 % where estimates are normal.\n";
+}
+
+std::string QuantileReportOf(const EngineInput& input, std::size_t index,
+                             const SeriesResults& series, const CombinationResults& results) {
+    std::string text = CombinationHead(input, index, results);
+    if (!results.fit)
+        return text;
+    text += '\n';
+    AppendRow(text, {"T", "e", "estimate", "average", "bias", "deviation", "lower", "upper"});
+    for (std::size_t i = 0; i < input.periods.size(); ++i)
+        AppendQuantile(text, input.periods[i], series.exceedances[i],
+                       results.quantiles.atPeriods[i]);
+    AppendResamples(text, input.uncertainty, results.quantiles);
+    return text;
+}
+
+} // namespace ryn
