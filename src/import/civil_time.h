@@ -33,7 +33,8 @@ struct TimeParts {
 
 enum class TimeResult {
     Ok,
-    Incomplete, ///< a date without its day or month ("1869-07", "1895-07-00")
+    Incomplete,   ///< a date without its day or month ("1869-07", "1895-07-00", "1869")
+    FirstOfMonth, ///< a date without its day, taken as the first of its month; of TimeReader only
     Bad,
 };
 

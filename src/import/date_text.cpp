@@ -133,13 +133,36 @@ bool TakeClockTail(TextCursor* cursor, TimeParts* parts) {
     return false;
 }
 
+/// The year with four digits, or a month's name, tells which is which.
+TimeResult ParseYearMonth(std::string_view text, TimeParts* parts) {
+    TextCursor cursor(text);
+    DateTokens date;
+    if (!TakeDateTokens(&cursor, &date) || !cursor.IsAtEnd() || date.separator == '.')
+        return TimeResult::Bad;
+    if (date.count == 1)
+        return date.token[0].digits == 4 ? TimeResult::Incomplete : TimeResult::Bad;
+    if (date.count != 2)
+        return TimeResult::Bad;
+    // Either order is clear: only one of the two has four digits.
+    const bool yearFirst = date.token[0].digits == 4;
+    const DateToken& year = date.token[yearFirst ? 0 : 1];
+    const DateToken& month = date.token[yearFirst ? 1 : 0];
+    if ((year.digits != 4 && month.digits != 0) || !SetYear(year, parts) || !SetMonth(month, parts))
+        return TimeResult::Bad;
+    return parts->month == 0 ? TimeResult::Incomplete : TimeResult::Ok;
+}
+
 TimeResult ParseSeparated(std::string_view text, DateForm form, TimeParts* parts) {
     TextCursor cursor(text);
     DateTokens date;
     if (!TakeDateTokens(&cursor, &date))
         return TimeResult::Bad;
-    if (date.count < 3)
-        return cursor.IsAtEnd() && IsPartOfDate(date) ? TimeResult::Incomplete : TimeResult::Bad;
+    if (date.count < 3) {
+        if (!cursor.IsAtEnd() || !IsPartOfDate(date))
+            return TimeResult::Bad;
+        (void)ParseYearMonth(text, parts); // as far as the parts are there
+        return TimeResult::Incomplete;
+    }
     if (!AssignTokens(date, form, parts) || !TakeClockTail(&cursor, parts))
         return TimeResult::Bad;
     return parts->month == 0 || parts->day == 0 ? TimeResult::Incomplete : TimeResult::Ok;
@@ -176,25 +199,6 @@ TimeResult ParseCompact(std::string_view text, DateForm form, TimeParts* parts) 
     if (!isWhole)
         return TimeResult::Bad;
     return parts->month == 0 || parts->day == 0 ? TimeResult::Incomplete : TimeResult::Ok;
-}
-
-/// The year with four digits, or a month's name, tells which is which.
-TimeResult ParseYearMonth(std::string_view text, TimeParts* parts) {
-    TextCursor cursor(text);
-    DateTokens date;
-    if (!TakeDateTokens(&cursor, &date) || !cursor.IsAtEnd() || date.separator == '.')
-        return TimeResult::Bad;
-    if (date.count == 1)
-        return date.token[0].digits == 4 ? TimeResult::Incomplete : TimeResult::Bad;
-    if (date.count != 2)
-        return TimeResult::Bad;
-    // Either order is clear: only one of the two has four digits.
-    const bool yearFirst = date.token[0].digits == 4;
-    const DateToken& year = date.token[yearFirst ? 0 : 1];
-    const DateToken& month = date.token[yearFirst ? 1 : 0];
-    if ((year.digits != 4 && month.digits != 0) || !SetYear(year, parts) || !SetMonth(month, parts))
-        return TimeResult::Bad;
-    return parts->month == 0 ? TimeResult::Incomplete : TimeResult::Ok;
 }
 
 TimeResult ParseCompactYearMonth(std::string_view text, TimeParts* parts) {

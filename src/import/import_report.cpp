@@ -89,7 +89,7 @@ std::string ReasonText(DropReason reason) {
     case DropReason::MissingValue:
         return "with a missing value";
     case DropReason::IncompleteDate:
-        return "with a date that lacks its day or month";
+        return "with a date that lacks its month";
     case DropReason::EmptyRow:
         return "without content";
     case DropReason::Divider:

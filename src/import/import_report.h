@@ -11,7 +11,7 @@ namespace ryn {
 /// Why rows were left out.
 enum class DropReason {
     MissingValue,   ///< an item's value is missing
-    IncompleteDate, ///< the date lacks its day or month
+    IncompleteDate, ///< the date lacks its month
     EmptyRow,       ///< nothing but delimiters
     Divider,        ///< a line without letters and digits, or a merge mark
     RepeatedHeader, ///< the line of names again

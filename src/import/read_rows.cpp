@@ -66,6 +66,7 @@ class RowParser {
     std::optional<long> firstWithOffset;
     std::optional<long> firstWithoutOffset;
     long rowsWithHour24 = 0;
+    DroppedRows withoutDay; ///< lines of dates without a day, which are not dropped
 };
 
 bool RowParser::PassOver(const TableRecord& record) {
@@ -229,6 +230,8 @@ void RowParser::TakeRow(const TableRecord& record, const std::vector<std::string
         report->Dropped(DropReason::IncompleteDate).Add(record.line);
         return;
     }
+    if (timeResult == TimeResult::FirstOfMonth)
+        withoutDay.Add(record.line);
     CheckOffset(record.line);
     if (!HasFields(record, fields.size()))
         return;
@@ -283,6 +286,9 @@ Status RowParser::Finish(const std::string& source) {
                                   std::to_string(*firstWithOffset) + " has");
     if (firstWithOffset)
         report->notes.emplace_back("times have an offset from UTC; they are stored as UTC");
+    if (withoutDay.count > 0)
+        report->notes.push_back("dates without a day are taken as the first of their month: line " +
+                                LineList(withoutDay.firstLines, withoutDay.count));
     if (rowsWithHour24 > 0)
         report->notes.emplace_back("hour 24 is 00:00 of the next day");
     return Status::Ok();

@@ -122,13 +122,24 @@ TimeResult TimeReader::Read(std::span<const std::string_view> fields, Millis* mo
             return one;
         result = one == TimeResult::Ok ? result : one;
     }
-    if (result != TimeResult::Ok)
-        return result;
-    result = MomentOf(parts, layout.defaults, moment);
+    if (result == TimeResult::Ok)
+        result = MomentOf(parts, layout.defaults, moment);
+    if (result == TimeResult::Incomplete)
+        return ReadWithoutDay(moment);
     if (result != TimeResult::Ok)
         return result;
     *moment += layout.origin;
     return layout.isRelative || IsInCalendar(*moment) ? TimeResult::Ok : TimeResult::Bad;
+}
+
+/// The peak of a historic flood often has a month and no day. To leave it out would cost the series
+/// its largest value.
+TimeResult TimeReader::ReadWithoutDay(Millis* moment) {
+    if (parts.year < 0 || parts.month < 1 || parts.day > 0)
+        return TimeResult::Incomplete;
+    parts.day = 1;
+    return MomentOf(parts, layout.defaults, moment) == TimeResult::Ok ? TimeResult::FirstOfMonth
+                                                                      : TimeResult::Bad;
 }
 
 std::string TimeReader::TextOf(std::span<const std::string_view> fields) const {

@@ -13,8 +13,9 @@ class TimeReader {
   public:
     explicit TimeReader(const TimeLayout& timeLayout) : layout(timeLayout) {}
 
-    /// Ok with *moment set; Incomplete for a date without its day; Bad for no time, a missing field
-    /// included. Not for a layout with StartAndStep.
+    /// Ok with *moment set; FirstOfMonth with it set for a date without its day among whole ones;
+    /// Incomplete for one without its month; Bad for no time, a missing field included. Not for a
+    /// layout with StartAndStep.
     TimeResult Read(std::span<const std::string_view> fields, Millis* moment);
 
     /// Whether the row read last carried an offset from UTC.
@@ -28,6 +29,7 @@ class TimeReader {
 
   private:
     TimeResult ReadColumn(const TimeColumn& column, std::string_view field);
+    TimeResult ReadWithoutDay(Millis* moment);
 
     const TimeLayout& layout;
     TimeParts parts;

@@ -151,7 +151,8 @@ TimeFit FitTime(const SampleRows& rows, const TimeLayout& time) {
     for (const auto& fields : rows.All()) {
         const TimeResult result = reader.Read(fields, &moment);
         fit.bad += result == TimeResult::Bad ? 1.0 : 0.0;
-        fit.incomplete += result == TimeResult::Incomplete ? 1.0 : 0.0;
+        fit.incomplete +=
+            result == TimeResult::Incomplete || result == TimeResult::FirstOfMonth ? 1.0 : 0.0;
         if (result != TimeResult::Ok)
             continue;
         fit.ok += 1.0;

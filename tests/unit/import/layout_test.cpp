@@ -307,11 +307,16 @@ TEST(TableLayout, KnowsManyWaysToWriteATime) {
          "time [hours since 1990-01-01],v\n0,1.5\n12,2.5\n",
          "1990-01-01 1.5; 1990-01-01 12:00:00 2.5",
          {}},
-        {"dates that lack their day are left out, and told",
-         "peak_dt\tpeak_va\n1895-07-00\t5\n1869-07\t6\n1939\t7\n1940-07-16\t8\n1941-09-16\t9\n"
+        {"dates without a day are the first of their month, and told",
+         "peak_dt\tpeak_va\n1869-07\t6\n1895-07-00\t5\n1939\t7\n1940-07-16\t8\n1941-09-16\t9\n"
          "1942-09-16\t10\n1943-09-16\t11\n",
-         "1940-07-16 8; 1941-09-16 9; 1942-09-16 10; 1943-09-16 11",
-         {"left out: 3 with a date that lacks its day or month (line 2, 3, 4)"}},
+         "1869-07-01 6; 1895-07-01 5; 1940-07-16 8; 1941-09-16 9; 1942-09-16 10; 1943-09-16 11",
+         {"dates without a day are taken as the first of their month: line 2, 3",
+          "left out: 1 with a date that lacks its month (line 4)"}},
+        {"in American order too",
+         "Date,Q\n1929-03,220\n11/22/1930,34\n1/19/1932,22\n4/18/1933,35\n",
+         "1929-03-01 220; 1930-11-22 34; 1932-01-19 22; 1933-04-18 35",
+         {}},
     });
 }
 
