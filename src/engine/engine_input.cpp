@@ -2,8 +2,7 @@
 
 #include <cmath>
 
-#include "base/number_text.h"
-
+#include "engine/plain_text.h"
 namespace ryn {
 
 namespace {
@@ -67,10 +66,10 @@ void ReadFrame(const SectionReader& reader, EngineInput& input) {
     input.averageNumber = reader.Required<double>("AvgAnNum");
     // Written so that NaN is a fault.
     if (!std::isfinite(input.threshold))
-        reader.Fault("Threshold", "is " + ShortestText(input.threshold) + ", not a level");
+        reader.Fault("Threshold", "is " + NumberText(input.threshold) + ", not a level");
     if (reader.Exists() && !(input.averageNumber > 0 && std::isfinite(input.averageNumber)))
         reader.Fault("AvgAnNum",
-                     "is " + ShortestText(input.averageNumber) +
+                     "is " + NumberText(input.averageNumber) +
                          ", but the mean number of events a year must be greater than 0");
     input.frame = {SeriesKind::PartialDuration, input.threshold, input.averageNumber};
 }

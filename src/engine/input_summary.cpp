@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <array>
 
-#include "base/number_text.h"
 #include "engine/plain_text.h"
 #include "stats/monte_carlo.h"
 
@@ -24,8 +23,8 @@ std::string SeriesLine(const EngineInput& input) {
 std::string KindLine(const EngineInput& input) {
     if (input.frame.kind == SeriesKind::AnnualMaximum)
         return "Kind: annual maxima";
-    return "Kind: partial durations, threshold " + ShortestText(input.threshold) +
-           UnitSuffix(input) + ", " + ShortestText(input.averageNumber) + " events a year";
+    return "Kind: partial durations, threshold " + NumberText(input.threshold) + UnitSuffix(input) +
+           ", " + NumberText(input.averageNumber) + " events a year";
 }
 
 std::string PeriodsLine(const EngineInput& input) {
@@ -33,7 +32,7 @@ std::string PeriodsLine(const EngineInput& input) {
     std::string line = "Return periods in years: ";
     const std::size_t shown = std::min(input.periods.size(), kMostShown);
     for (std::size_t i = 0; i < shown; ++i)
-        line += (i == 0 ? "" : ", ") + ShortestText(input.periods[i]);
+        line += (i == 0 ? "" : ", ") + NumberText(input.periods[i]);
     if (input.periods.empty())
         line += "none";
     if (shown < input.periods.size())

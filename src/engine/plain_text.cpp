@@ -1,7 +1,10 @@
 #include "engine/plain_text.h"
 
+#include <cmath>
 #include <cstddef>
+#include <limits>
 
+#include "base/number_text.h"
 #include "kvf/characters.h"
 
 namespace ryn {
@@ -49,6 +52,12 @@ std::string PlainName(std::string_view name) {
             return PlainText(name.substr(0, end)) + "...";
         end = next;
     }
+}
+
+std::string NumberText(double value) {
+    if (std::fabs(value) > static_cast<double>(std::numeric_limits<float>::max()))
+        return ShortestText(value);
+    return ShortestText(static_cast<float>(value));
 }
 
 } // namespace ryn

@@ -12,4 +12,8 @@ std::string PlainText(std::string_view text);
 /// The same for a name, which is cut after some hundred bytes with "..." at its end.
 std::string PlainName(std::string_view name);
 
+/// A number within a sentence: with the digits that a 32-bit float has, in which series are stored,
+/// so that 0.1 is not told as 0.10000000149. "nan", "inf" and "-inf" too.
+std::string NumberText(double value);
+
 } // namespace ryn

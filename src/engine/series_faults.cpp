@@ -1,8 +1,8 @@
 #include <algorithm>
 #include <cmath>
 
-#include "base/number_text.h"
 #include "engine/engine_input.h"
+#include "engine/plain_text.h"
 
 namespace ryn {
 
@@ -17,7 +17,7 @@ void FindFirst(const std::vector<double>& values, Predicate isBad, const std::st
     const auto bad = std::find_if(values.begin(), values.end(), isBad);
     if (bad != values.end())
         faults.push_back("value " + std::to_string(bad - values.begin() + 1) +
-                         " of the series is " + ShortestText(static_cast<float>(*bad)) + what);
+                         " of the series is " + NumberText(*bad) + what);
 }
 
 std::string CountFault(std::size_t count) {
@@ -39,14 +39,13 @@ Sentences SeriesFaults(const EngineInput& input) {
     if (!faults.empty())
         return faults;
     if (std::equal(values.begin() + 1, values.end(), values.begin()))
-        faults.push_back("all values of the series are equal (" +
-                         ShortestText(static_cast<float>(values.front())) + ")");
+        faults.push_back("all values of the series are equal (" + NumberText(values.front()) + ")");
     if (input.frame.kind == stats::SeriesKind::PartialDuration) {
         // What a value at the threshold may lose when it is stored as a 32-bit float.
         const double lowest = input.threshold - 1e-6 * std::max(1.0, std::fabs(input.threshold));
         FindFirst(
             values, [=](double x) { return x < lowest; },
-            ", below DefineEVS/Threshold " + ShortestText(input.threshold), faults);
+            ", below DefineEVS/Threshold " + NumberText(input.threshold), faults);
     }
     return faults;
 }
