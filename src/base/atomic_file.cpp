@@ -7,8 +7,10 @@
 #include <random>
 #include <sys/stat.h>
 #include <unistd.h>
+#include <utility>
 
 #include "base/path_parts.h"
+#include "base/temporary_files.h"
 
 namespace ryn {
 
@@ -83,6 +85,7 @@ Status AtomicFile::Open(const std::string& path) {
     if (fd < 0)
         return Status::FromErrno(path, errno);
     temporary = name;
+    noted = NoteTemporary(temporary);
     target = resolved;
     writeError = 0;
     if (replaces)
@@ -123,6 +126,7 @@ Status AtomicFile::Commit(Durability durability) {
         Discard();
         return Status::FromErrno(name, error);
     }
+    ForgetTemporary(std::exchange(noted, -1));
     temporary.clear();
     if (durability == Durability::Flushed)
         FlushDirectory(SplitPath(target).directory);
@@ -133,6 +137,7 @@ void AtomicFile::Discard() {
     stream.reset();
     if (!temporary.empty())
         ::unlink(temporary.c_str());
+    ForgetTemporary(std::exchange(noted, -1));
     temporary.clear();
 }
 

@@ -1,5 +1,6 @@
 #include "apps/cli/series_info.h"
 
+#include <algorithm>
 #include <cmath>
 #include <ostream>
 
@@ -39,8 +40,10 @@ void ExtendTimes(SeriesInfo& info, const COleDateTime& date) {
     }
     if (!IsClearlyBefore(info.last, date))
         ++info.backwardSteps;
+    const double step = (date - info.last).GetTotalDays();
     const double longest = (info.gapTo - info.gapFrom).GetTotalDays(); // NaN at the start
-    if (!((date - info.last).GetTotalDays() <= longest)) {
+    info.shortestStep = info.gapTo.IsValid() ? std::min(info.shortestStep, step) : step;
+    if (!(step <= longest)) {
         info.gapFrom = info.last;
         info.gapTo = date;
     }
@@ -65,8 +68,11 @@ int AxisTextId(AxisKind kind) {
     return kTextCliAxisEqRelative + static_cast<int>(kind);
 }
 
-bool IsEquidistant(AxisKind kind) {
-    return kind == AxisKind::EquidistantRelative || kind == AxisKind::EquidistantCalendar;
+/// Whether all steps are equal, also on an axis that lists them one by one, as files of other
+/// programs do.
+bool IsRegular(const SeriesInfo& info) {
+    constexpr double kHalfSecond = 0.5 / 86400.0;
+    return (info.gapTo - info.gapFrom).GetTotalDays() - info.shortestStep < kHalfSecond;
 }
 
 Json JsonOfSample(const DatedValue& sample) {
@@ -115,7 +121,7 @@ void PrintHead(std::ostream& out, const SeriesInfo& info) {
         head.AddRow({TextOf(kTextCliFirst), DateForPeople(info.first)});
         head.AddRow({TextOf(kTextCliLast), DateForPeople(info.last)});
     }
-    if (info.gapFrom.IsValid() && IsEquidistant(info.axis))
+    if (info.gapFrom.IsValid() && IsRegular(info))
         head.AddRow({TextOf(kTextCliTimeStep), LengthForPeople(info.gapTo - info.gapFrom)});
     else if (info.gapFrom.IsValid())
         head.AddRow({TextOf(kTextCliLongestGap), GapText(info)});
