@@ -110,7 +110,8 @@ int CRynEditDoc::OnSaveDocument(const std::string& path) {
         ready = WriteParameters(name, baseDirectory);
     NoteSaveError(std::move(ready));
     // Whether or not the parameters could be written: a run has emptied the file by now.
-    if (results.IsValid())
+    // Without a name for them the results live in memory alone.
+    if (results.IsValid() && !globalKvf->DefineEVS().OutputFileName.empty())
         NoteSaveError(WriteResults(baseDirectory));
     SetModifiedFlag(0);
     return 1;

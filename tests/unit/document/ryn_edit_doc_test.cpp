@@ -308,6 +308,9 @@ TEST(Document, TellsOfAResultFileThatCannotBeWritten) {
     opened.document.OnSaveDocument(directory.Path("a.RYN"));
     EXPECT_FALSE(opened.document.IsModified());
     EXPECT_THAT(opened.document.TakeSaveError().Text(), HasSubstr("none/a.res"));
+    opened.document.GetGlobalKvf().DefineEVS().OutputFileName.clear(); // nowhere to write to
+    opened.document.OnSaveDocument(directory.Path("a.RYN"));
+    EXPECT_TRUE(opened.document.TakeSaveError());
 }
 
 TEST(Document, IsClosedByItsOwner) {
