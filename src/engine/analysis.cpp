@@ -42,6 +42,8 @@ void RunTests(const EngineInput& input, SeriesResults& series) {
         series.shift = stats::ShiftTestOf(input.values, input.sampleNumbers);
 }
 
+// One longer than all time has an event only where the distribution has an upper bound, and one
+// that is no number has none.
 void FindEvents(const EngineInput& input, SeriesResults& series) {
     for (const double period : input.periods) {
         const double exceedance =
@@ -73,6 +75,8 @@ ResampledQuantiles EstimatesAlone(const stats::Distribution& fitted, const Serie
     return quantiles;
 }
 
+// In one pass for table and curves: the resamples are the same, and refitting them is nearly all of
+// the time.
 ResampledQuantiles Quantiles(const EngineInput& input, const SeriesResults& series,
                              const stats::Combination& combination,
                              const stats::Distribution& fitted) {
@@ -89,6 +93,7 @@ ResampledQuantiles Quantiles(const EngineInput& input, const SeriesResults& seri
     return EstimatesAlone(fitted, series);
 }
 
+// The log-likelihood comes with the fit and costs nothing; it is written where it was asked for.
 FitMeasures Measures(const FitMeasureRequests& asked, const SeriesResults& series,
                      const stats::FittedModel& model, const stats::ProbabilityPlot& plot) {
     const stats::Distribution& fitted = model.distribution;
@@ -124,6 +129,8 @@ void Evaluate(const EngineInput& input, const SeriesResults& series,
     MakeFiniteOrNaN(results.quantiles.atProbabilities);
 }
 
+// Full lists and no short ones: what is read by position in one combination must stand at the same
+// position in all.
 void FillWithNaN(const SeriesResults& series, CombinationResults& results) {
     FitMeasures& measures = results.measures;
     measures.chiSquared.statistic = measures.chiSquared.level = kNaN;
@@ -150,6 +157,7 @@ std::optional<SeriesResults> AnalyseSeries(const EngineInput& input) {
     RunTests(input, series);
     FindEvents(input, series);
     series.curveAbscissae = stats::DensityCurveAbscissae(series.histogram, input.frame.kind);
+    // Common to all combinations, so that their curves can be compared point by point.
     series.curveProbabilities = stats::QuantileCurveProbabilities(
         {input.values.size(), LongestPeriod(series), input.frame});
     return series;

@@ -28,6 +28,8 @@ double ShortestPeriod(const EngineInput& input) {
                : 1 / input.frame.rate;
 }
 
+// Samples of few events have no quantile at a short period; too many of them leave it without
+// average.
 std::size_t CountWithoutAverage(const std::vector<ResampledQuantile>& quantiles) {
     return static_cast<std::size_t>(
         std::count_if(quantiles.begin(), quantiles.end(), [](const ResampledQuantile& quantile) {
@@ -46,7 +48,7 @@ std::size_t CountLost(const SeriesResults& series, const ResampledQuantiles& fou
 
 void AddUncertaintyWarnings(Sentences& warnings, const std::string& label,
                             const ResampledQuantiles& found) {
-    if (found.asked == 0)
+    if (found.asked == 0) // no uncertainty was wanted
         return;
     if (found.kept < found.needed) {
         warnings.push_back(label + ": no uncertainty: only " + std::to_string(found.kept) + " of " +

@@ -27,8 +27,9 @@ std::string KindLine(const EngineInput& input) {
            ", " + NumberText(input.averageNumber) + " events a year";
 }
 
+// Whether T counts events or annual maxima moves a quantile by much at short periods.
 std::string PeriodsLine(const EngineInput& input) {
-    constexpr std::size_t kMostShown = 30;
+    constexpr std::size_t kMostShown = 30; // a line that can still be read
     std::string line = "Return periods in years: ";
     const std::size_t shown = std::min(input.periods.size(), kMostShown);
     for (std::size_t i = 0; i < shown; ++i)
@@ -83,6 +84,7 @@ constexpr std::array<std::string_view, 4> kLogNormalNames = {
     "bias correction of skewness I", "bias correction of skewness II",
     "lower bound quantile method I", "lower bound quantile method II"};
 
+// What was done and not what the option says, which some methods and kinds of series overrule.
 std::string LocationText(const stats::Combination& combination, SeriesKind kind) {
     if (stats::EffectiveLocation(combination, kind) == stats::LocationType::Estimated)
         return ", location estimated";

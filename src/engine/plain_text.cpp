@@ -44,6 +44,7 @@ std::string PlainName(std::string_view name) {
     constexpr std::size_t kLongest = 160;
     if (name.size() <= kLongest)
         return PlainText(name);
+    // Cut between characters: half of one would show as a question mark.
     std::size_t end = 0;
     while (true) {
         const std::size_t length = KvfUtf8Length(name, end);
@@ -55,6 +56,7 @@ std::string PlainName(std::string_view name) {
 }
 
 std::string NumberText(double value) {
+    // Beyond the range of floats the cast has no defined result.
     if (std::fabs(value) > static_cast<double>(std::numeric_limits<float>::max()))
         return ShortestText(value);
     return ShortestText(static_cast<float>(value));

@@ -11,6 +11,7 @@ namespace ryn {
 namespace {
 
 constexpr int kDigits = 6;
+// A sign, six digits in fixed notation down to 0.0001, and two blanks between columns.
 constexpr std::size_t kColumnWidth = 15;
 constexpr std::size_t kNameWidth = 26;
 
@@ -34,6 +35,7 @@ std::string SixDigits(double value) {
     std::array<char, 64> buffer{};
     char* const end = buffer.data() + buffer.size();
     const int power = value == 0 || std::isinf(value) ? 0 : PowerAfterRounding(value);
+    // Levels and discharges in people's own notation; beyond, zeros would have to be counted.
     const bool isFixed = power >= -4 && power <= 8;
     const auto written =
         std::to_chars(buffer.data(), end, value,

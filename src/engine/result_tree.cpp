@@ -39,6 +39,7 @@ void PutCount(KvfTree* tree, const char* keyword, std::size_t count) {
     kvfPutParam(tree, keyword, static_cast<int>(count));
 }
 
+// Pages show these on their own; they are handed on as they came.
 void WriteSettings(const SeriesLabels& labels, KvfTree* tree) {
     const OpenSection section(tree, "Settings");
     kvfPutParam(tree, "ItemName", labels.itemName);
@@ -90,11 +91,13 @@ void WriteSampleStatistics(const EngineInput& input, const SeriesResults& series
     const OpenSection section(tree, "SampleStatistics");
     PutCount(tree, "SampleSize", series.statistics.count);
     kvfPutParam(tree, "bPDS", input.frame.kind == stats::SeriesKind::PartialDuration);
+    // As stored: the frame of annual maxima has no threshold and rate 1.
     kvfPutParam(tree, "Threshold", input.threshold);
     kvfPutParam(tree, "AvgAnNum", input.averageNumber);
     WriteMoments(series.statistics, tree);
 }
 
+// Densities, so that bars and density curves share an axis.
 void WriteHistogram(const stats::Histogram& histogram, KvfTree* tree) {
     const OpenSection section(tree, "Histogram");
     PutCount(tree, "NoIntHistogram", histogram.counts.size());
@@ -119,6 +122,7 @@ void WritePlottingPositions(const std::vector<double>& ascending, KvfTree* tree)
     }
 }
 
+// Three places whatever the distribution has, so that tables line up.
 void WriteParameters(const CombinationResults& results, KvfTree* tree) {
     const OpenSection section(tree, "ParameterEstimates");
     for (std::size_t i = 0; i < 3; ++i) {
@@ -146,6 +150,8 @@ void PutMeasure(KvfTree* tree, const char* flag, bool asked,
         kvfPutParam(tree, number.keyword, asked ? number.value : 0.0);
 }
 
+// The flags follow the request and not the outcome: the grid batch counts its output items by
+// them, and a failed fit must not shift those that follow.
 void WriteMeasures(const FitMeasureRequests& asked, const FitMeasures& found, KvfTree* tree) {
     const OpenSection section(tree, "GoodnessOfFitStatistics");
     PutMeasure(tree, "ChiSquaredTest", asked.chiSquared,
@@ -203,6 +209,7 @@ void WriteDistributions(const EngineInput& input, const SeriesResults& series,
     PutList(tree, "XvaluePDFPlot", series.curveAbscissae);
     PutCount(tree, "NoItemProbabilityPlot", series.curveProbabilities.size());
     PutList(tree, "ProbabilityPlot", series.curveProbabilities);
+    // As they were asked for, those without an event included: results go by position.
     PutCount(tree, "NoReturnPeriods", input.periods.size());
     PutList(tree, "ReturnPeriods", input.periods);
     for (std::size_t i = 0; i < combinations.size(); ++i) {
