@@ -33,6 +33,7 @@ void MakeFiniteOrNaN(std::vector<ResampledQuantile>& quantiles) {
                     FiniteOrNaN(quantile.standardDeviation), FiniteOrNaN(quantile.bias)};
 }
 
+// In time order: all but the last depend on it.
 void RunTests(const EngineInput& input, SeriesResults& series) {
     if (input.tests.run)
         series.run = stats::RunTestOf(input.values);
@@ -54,6 +55,7 @@ void FindEvents(const EngineInput& input, SeriesResults& series) {
     }
 }
 
+// The curves go beyond it; a period without an event must not stretch them.
 double LongestPeriod(const SeriesResults& series) {
     double longest = 0;
     for (const double period : series.periods)
@@ -65,6 +67,7 @@ ResampledQuantile EstimateAlone(double estimate) {
     return {estimate, kNaN, kNaN, kNaN};
 }
 
+// The counts of resamples stay 0, by which warnings and report know that there were none.
 ResampledQuantiles EstimatesAlone(const stats::Distribution& fitted, const SeriesResults& series) {
     ResampledQuantiles quantiles;
     for (const double exceedance : series.exceedances)
@@ -112,6 +115,7 @@ FitMeasures Measures(const FitMeasureRequests& asked, const SeriesResults& serie
     return measures;
 }
 
+// Everything that follows from a fit that stands.
 void Evaluate(const EngineInput& input, const SeriesResults& series,
               const stats::Combination& combination, CombinationAnalysis& analysis) {
     CombinationResults& results = analysis.results;

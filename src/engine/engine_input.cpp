@@ -16,6 +16,8 @@ struct Range {
     bool Holds(int value) const { return value >= lowest && value <= highest; }
 };
 
+// Of DistributionType and EstimationMethod. Whether a distribution goes with the kind of series is
+// a combination's own affair: it fails, and the others are fitted.
 constexpr Range kDistributions{0, 10};
 constexpr Range kMethods{0, 2};
 
@@ -83,6 +85,7 @@ void ReadDefinition(const SectionReader& reader, EngineInput& input) {
 }
 
 /// A list's own count is for people who read the file; the list itself is what counts.
+/// A list whose end was lost with an editor's slip would otherwise go unnoticed.
 void CompareCount(const SectionReader& reader, std::size_t found, Sentences& warnings) {
     const int told = reader.Optional("NoOfItems", static_cast<int>(found));
     if (told != static_cast<int>(found))
@@ -90,6 +93,7 @@ void CompareCount(const SectionReader& reader, std::size_t found, Sentences& war
                            std::to_string(found) + " were found; these are taken");
 }
 
+// Any number is taken; which have an event depends on the series and is told with it.
 void ReadPeriods(const SectionReader& reader, InputReading& reading) {
     EngineInput& input = reading.input;
     const bool annual = reader.Optional("AnnualReturnPeriod", false);
@@ -204,6 +208,8 @@ bool GetInt(const KvfParam& param, int& value) {
     return kvfParamType(param) == KvfType::Int;
 }
 
+// The two lists and their count were written together: where they disagree, nobody knows which
+// value belongs to which subsample.
 void ReadSeries(const SectionReader& reader, EngineInput& input, const Sentences& faults) {
     if (!reader.Exists())
         return;
@@ -212,6 +218,7 @@ void ReadSeries(const SectionReader& reader, EngineInput& input, const Sentences
     const int told = reader.Required<int>("NoOfItems");
     if (faults.size() > noted)
         return;
+    // Before anything is made room for.
     if (told > static_cast<int>(kMostValues))
         return reader.Fault("NoOfItems", "is " + std::to_string(told) + "; at most " +
                                              std::to_string(kMostValues) + " values are analysed");

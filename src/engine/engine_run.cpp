@@ -42,6 +42,7 @@ EngineRun::EngineRun(const std::string& directory, RunLog& runLog)
       goodness(directory, kGoodnessReportName),
       quantiles(directory, kQuantileReportName) {}
 
+// All faults of a tree at once, not the first alone: they are mended in one go.
 EngineStatus EngineRun::Execute(const KvfTree* tree, KvfHandle* output) {
     InputReading reading = ReadEngineInput(tree);
     const EngineInput& input = reading.input;
@@ -55,6 +56,7 @@ EngineStatus EngineRun::Execute(const KvfTree* tree, KvfHandle* output) {
     return Analyse(input, output);
 }
 
+// A series without faults can still have no histogram: doubles that differ in their last bit.
 EngineStatus EngineRun::Analyse(const EngineInput& input, KvfHandle* output) {
     const Sentences seriesFaults = SeriesFaults(input);
     if (!seriesFaults.empty())
@@ -77,6 +79,7 @@ EngineStatus EngineRun::Analyse(const EngineInput& input, KvfHandle* output) {
     return log.HasWarnings() ? EngineStatus::DoneWithWarnings : EngineStatus::Done;
 }
 
+// Log and reports say the same.
 EngineStatus EngineRun::Fail(EngineStatus status, const EngineInput& input,
                              const Sentences& faults) {
     Sentences told;

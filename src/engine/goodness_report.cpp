@@ -107,6 +107,8 @@ void AppendKolmogorovSmirnov(std::string& text, const stats::KolmogorovSmirnovTe
     AppendValue(text, "Level [%]", SixDigits(test.level));
 }
 
+// The two variates are the criterion's scale: without them it cannot be compared with one computed
+// from other quantiles.
 void AppendPlotMeasures(std::string& text, const FitMeasureRequests& asked,
                         const FitMeasures& found) {
     if (asked.leastSquares) {
@@ -135,6 +137,7 @@ void AppendMeasures(std::string& text, const FitMeasureRequests& asked,
     AppendPlotMeasures(text, asked, found);
     if (!asked.logLikelihood)
         return;
+    // Akaike (1974): likelihoods alone favour the distribution with more parameters.
     text += "\nLikelihood\n";
     AppendValue(text, "Log-likelihood", SixDigits(found.logLikelihood));
     AppendValue(text, "Akaike's criterion", SixDigits(stats::AkaikeCriterion(*results.fit)));

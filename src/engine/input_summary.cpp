@@ -12,6 +12,7 @@ namespace {
 
 using stats::SeriesKind;
 
+// Names come from data files of any origin.
 std::string SeriesLine(const EngineInput& input) {
     const std::string name = PlainName(input.labels.itemName);
     const std::string unit = PlainName(input.labels.unit);
@@ -20,6 +21,7 @@ std::string SeriesLine(const EngineInput& input) {
            " values";
 }
 
+// A rate comes from a count over a record length and has more digits than meaning.
 std::string KindLine(const EngineInput& input) {
     if (input.frame.kind == SeriesKind::AnnualMaximum)
         return "Kind: annual maxima";
@@ -44,6 +46,7 @@ std::string PeriodsLine(const EngineInput& input) {
     return line;
 }
 
+// With what somebody needs who wants the same numbers from another program.
 std::string UncertaintyLine(UncertaintyMethod method) {
     const stats::MonteCarloSettings settings;
     switch (method) {

@@ -23,6 +23,7 @@ bool BreaksLine(std::string_view character) {
 
 } // namespace
 
+// One character for each, so that nothing a name holds moves what stands behind it.
 std::string PlainText(std::string_view text) {
     std::string line;
     line.reserve(text.size());

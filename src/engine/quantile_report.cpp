@@ -55,6 +55,7 @@ void AppendResamples(std::string& text, UncertaintyMethod method,
 
 std::string QuantileReportHead(const EngineInput& input) {
     const std::string unit = PlainName(input.labels.unit);
+    // For partial durations e is not 1/T, which readers of annual maxima expect.
     return ReportHead(kQuantileReportSubject, input) + "Events are in " +
            (unit.empty() ? "the series' unit" : unit) + ", T in years; e is the probability that " +
            (input.frame.kind == stats::SeriesKind::AnnualMaximum ? "the maximum of a year"

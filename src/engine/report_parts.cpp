@@ -16,6 +16,7 @@ constexpr std::string_view kReadingNotes =
     "extreme value and generalised Pareto distributions has Hosking's sign: kappa > 0 means an\n"
     "upper bound, kappa < 0 a heavy tail (the shape in Coles (2001) is -kappa).\n";
 
+// No date: two runs over the same tree give the same report.
 std::string Title(std::string_view subject, const EngineInput& input) {
     std::string text;
     AppendHeading(text, subject, '=');

@@ -22,6 +22,7 @@ int PowerAfterRounding(double value) {
     return std::fabs(value) >= next * (1 - 0.5 * std::pow(10.0, -kDigits)) ? power + 1 : power;
 }
 
+// A cell too long for its column still stands apart from the one before.
 void AppendRight(std::string& text, std::string_view cell, std::size_t width) {
     text.append(cell.size() < width ? width - cell.size() : 1, ' ');
     text += cell;
@@ -29,6 +30,7 @@ void AppendRight(std::string& text, std::string_view cell, std::size_t width) {
 
 } // namespace
 
+// By to_chars, which knows no locale, and at the speed that 10^5 ranks want.
 std::string SixDigits(double value) {
     if (std::isnan(value))
         return "-";

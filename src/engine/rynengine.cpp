@@ -25,6 +25,7 @@ EngineStatus RunCaught(const KvfTree* tree, KvfHandle* output, const std::string
     return EngineStatus::SetUpFailed;
 }
 
+// The last line stands in the log whatever happened in between.
 EngineStatus RunLogged(const KvfTree* tree, KvfHandle* output) {
     // First of all, so that whatever is wrong with the rest of the tree can be told.
     const std::string directory = EngineDirectory(tree);

@@ -4,6 +4,7 @@ namespace ryn {
 
 namespace {
 
+// By the type of a value, for whoever has the file in an editor.
 constexpr const char* Wanted(int /*type*/) {
     return "is not a whole number";
 }
