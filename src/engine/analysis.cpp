@@ -33,6 +33,7 @@ void MakeFiniteOrNaN(std::vector<ResampledQuantile>& quantiles) {
                     FiniteOrNaN(quantile.standardDeviation), FiniteOrNaN(quantile.bias)};
 }
 
+// In time order: all but the last depend on it.
 void RunTests(const EngineInput& input, SeriesResults& series) {
     if (input.tests.run)
         series.run = stats::RunTestOf(input.values);
@@ -42,6 +43,8 @@ void RunTests(const EngineInput& input, SeriesResults& series) {
         series.shift = stats::ShiftTestOf(input.values, input.sampleNumbers);
 }
 
+// One longer than all time has an event only where the distribution has an upper bound, and one
+// that is no number has none.
 void FindEvents(const EngineInput& input, SeriesResults& series) {
     for (const double period : input.periods) {
         const double exceedance =
@@ -52,6 +55,7 @@ void FindEvents(const EngineInput& input, SeriesResults& series) {
     }
 }
 
+// The curves go beyond it; a period without an event must not stretch them.
 double LongestPeriod(const SeriesResults& series) {
     double longest = 0;
     for (const double period : series.periods)
@@ -63,6 +67,7 @@ ResampledQuantile EstimateAlone(double estimate) {
     return {estimate, kNaN, kNaN, kNaN};
 }
 
+// The counts of resamples stay 0, by which warnings and report know that there were none.
 ResampledQuantiles EstimatesAlone(const stats::Distribution& fitted, const SeriesResults& series) {
     ResampledQuantiles quantiles;
     for (const double exceedance : series.exceedances)
@@ -73,6 +78,8 @@ ResampledQuantiles EstimatesAlone(const stats::Distribution& fitted, const Serie
     return quantiles;
 }
 
+// In one pass for table and curves: the resamples are the same, and refitting them is nearly all of
+// the time.
 ResampledQuantiles Quantiles(const EngineInput& input, const SeriesResults& series,
                              const stats::Combination& combination,
                              const stats::Distribution& fitted) {
@@ -89,6 +96,7 @@ ResampledQuantiles Quantiles(const EngineInput& input, const SeriesResults& seri
     return EstimatesAlone(fitted, series);
 }
 
+// The log-likelihood comes with the fit and costs nothing; it is written where it was asked for.
 FitMeasures Measures(const FitMeasureRequests& asked, const SeriesResults& series,
                      const stats::FittedModel& model, const stats::ProbabilityPlot& plot) {
     const stats::Distribution& fitted = model.distribution;
@@ -107,6 +115,7 @@ FitMeasures Measures(const FitMeasureRequests& asked, const SeriesResults& serie
     return measures;
 }
 
+// Everything that follows from a fit that stands.
 void Evaluate(const EngineInput& input, const SeriesResults& series,
               const stats::Combination& combination, CombinationAnalysis& analysis) {
     CombinationResults& results = analysis.results;
@@ -124,6 +133,8 @@ void Evaluate(const EngineInput& input, const SeriesResults& series,
     MakeFiniteOrNaN(results.quantiles.atProbabilities);
 }
 
+// Full lists and no short ones: what is read by position in one combination must stand at the same
+// position in all.
 void FillWithNaN(const SeriesResults& series, CombinationResults& results) {
     FitMeasures& measures = results.measures;
     measures.chiSquared.statistic = measures.chiSquared.level = kNaN;
@@ -150,6 +161,7 @@ std::optional<SeriesResults> AnalyseSeries(const EngineInput& input) {
     RunTests(input, series);
     FindEvents(input, series);
     series.curveAbscissae = stats::DensityCurveAbscissae(series.histogram, input.frame.kind);
+    // Common to all combinations, so that their curves can be compared point by point.
     series.curveProbabilities = stats::QuantileCurveProbabilities(
         {input.values.size(), LongestPeriod(series), input.frame});
     return series;

@@ -15,6 +15,7 @@ std::string EngineDirectory(const KvfTree* tree) {
     // What follows a zero byte would be cut off by the system, and files written elsewhere.
     if (name.size() > kLongest || name.find('\0') != std::string::npos)
         return {};
+    // Absolute from here on, since the current directory belongs to the process and may move.
     return SplitPath(FullPath(name)).directory;
 }
 

@@ -16,6 +16,8 @@ struct Range {
     bool Holds(int value) const { return value >= lowest && value <= highest; }
 };
 
+// Of DistributionType and EstimationMethod. Whether a distribution goes with the kind of series is
+// a combination's own affair: it fails, and the others are fitted.
 constexpr Range kDistributions{0, 10};
 constexpr Range kMethods{0, 2};
 
@@ -52,6 +54,7 @@ int OptionalInRange(const SectionReader& reader, const char* keyword, Range rang
     return 0;
 }
 
+// Annual maxima need neither threshold nor rate; a file may hold anything there.
 void ReadFrame(const SectionReader& reader, EngineInput& input) {
     const int method = reader.Required<int>("SelectionMethod");
     if (method != 0 && method != 1)
@@ -67,7 +70,7 @@ void ReadFrame(const SectionReader& reader, EngineInput& input) {
     // Written so that NaN is a fault.
     if (!std::isfinite(input.threshold))
         reader.Fault("Threshold", "is " + NumberText(input.threshold) + ", not a level");
-    if (reader.Exists() && !(input.averageNumber > 0 && std::isfinite(input.averageNumber)))
+    if (reader.Has("AvgAnNum") && !(input.averageNumber > 0 && std::isfinite(input.averageNumber)))
         reader.Fault("AvgAnNum",
                      "is " + NumberText(input.averageNumber) +
                          ", but the mean number of events a year must be greater than 0");
@@ -82,6 +85,7 @@ void ReadDefinition(const SectionReader& reader, EngineInput& input) {
 }
 
 /// A list's own count is for people who read the file; the list itself is what counts.
+/// A list whose end was lost with an editor's slip would otherwise go unnoticed.
 void CompareCount(const SectionReader& reader, std::size_t found, Sentences& warnings) {
     const int told = reader.Optional("NoOfItems", static_cast<int>(found));
     if (told != static_cast<int>(found))
@@ -89,10 +93,13 @@ void CompareCount(const SectionReader& reader, std::size_t found, Sentences& war
                            std::to_string(found) + " were found; these are taken");
 }
 
+// Any number is taken; which have an event depends on the series and is told with it.
 void ReadPeriods(const SectionReader& reader, InputReading& reading) {
     EngineInput& input = reading.input;
     const bool annual = reader.Optional("AnnualReturnPeriod", false);
     input.meaning = annual ? stats::PeriodMeaning::OfAnnualMaximum : stats::PeriodMeaning::OfEvent;
+    // The editor's own reader ends at the first that is no number. Here the rest of the list would
+    // be lost without a word, so that it is a fault.
     int occurrence = 0;
     double period = 0;
     while (input.periods.size() <= kMostReturnPeriods &&
@@ -106,6 +113,7 @@ void ReadPeriods(const SectionReader& reader, InputReading& reading) {
     CompareCount(reader, input.periods.size(), reading.warnings);
 }
 
+// A flag that an older file does not have is off.
 void ReadAnalysis(const SectionReader& reader, InputReading& reading) {
     const auto flag = [&reader](const char* keyword) { return reader.Optional(keyword, false); };
     EngineInput& input = reading.input;
@@ -130,6 +138,7 @@ void ReadGridInput(const KvfSection* target, InputReading& reading) {
         reading.input.uncertainty = UncertaintyMethod::None;
 }
 
+// By its numbers and never by its name, which the user may choose.
 NamedCombination ReadCombination(const SectionReader& reader, Sentences& warnings) {
     NamedCombination read;
     read.name = reader.Optional("ItemName", std::string());
@@ -150,6 +159,7 @@ NamedCombination ReadCombination(const SectionReader& reader, Sentences& warning
 
 void ReadCombinations(const SectionReader& reader, InputReading& reading) {
     std::vector<NamedCombination>& combinations = reading.input.combinations;
+    // A gap in the numbering ends the list, as for the editor's own reader.
     while (true) {
         const std::string child = "Item" + std::to_string(combinations.size() + 1);
         const SectionReader item = reader.Inside(child);
@@ -187,6 +197,7 @@ std::vector<Type> ReadList(const SectionReader& reader, const char* keyword, int
     return values;
 }
 
+// Series are stored as floats; a list edited by hand has doubles and ints.
 bool GetDouble(const KvfParam& param, double& value) {
     value = kvfParamDouble(param);
     return kvfParamType(param) <= KvfType::Double;
@@ -197,13 +208,17 @@ bool GetInt(const KvfParam& param, int& value) {
     return kvfParamType(param) == KvfType::Int;
 }
 
+// The two lists and their count were written together: where they disagree, nobody knows which
+// value belongs to which subsample.
 void ReadSeries(const SectionReader& reader, EngineInput& input, const Sentences& faults) {
     if (!reader.Exists())
         return;
+    // Only a count that is there can disagree with the lists.
     const std::size_t noted = faults.size();
     const int told = reader.Required<int>("NoOfItems");
     if (faults.size() > noted)
         return;
+    // Before anything is made room for.
     if (told > static_cast<int>(kMostValues))
         return reader.Fault("NoOfItems", "is " + std::to_string(told) + "; at most " +
                                              std::to_string(kMostValues) + " values are analysed");

@@ -29,6 +29,7 @@ bool IsFitted(const CombinationResults& results) {
     return static_cast<bool>(results.fit);
 }
 
+/// An empty list has not failed: a user may want the statistics of the series alone.
 bool HaveAllFailed(const std::vector<CombinationResults>& combinations) {
     return !combinations.empty() &&
            std::none_of(combinations.begin(), combinations.end(), IsFitted);
@@ -41,6 +42,7 @@ EngineRun::EngineRun(const std::string& directory, RunLog& runLog)
       goodness(directory, kGoodnessReportName),
       quantiles(directory, kQuantileReportName) {}
 
+// All faults of a tree at once, not the first alone: they are mended in one go.
 EngineStatus EngineRun::Execute(const KvfTree* tree, KvfHandle* output) {
     InputReading reading = ReadEngineInput(tree);
     const EngineInput& input = reading.input;
@@ -51,6 +53,11 @@ EngineStatus EngineRun::Execute(const KvfTree* tree, KvfHandle* output) {
     for (const std::string& line : SummaryLines(input))
         log.Line(line);
     TellWarnings(reading.warnings);
+    return Analyse(input, output);
+}
+
+// A series without faults can still have no histogram: doubles that differ in their last bit.
+EngineStatus EngineRun::Analyse(const EngineInput& input, KvfHandle* output) {
     const Sentences seriesFaults = SeriesFaults(input);
     if (!seriesFaults.empty())
         return Fail(EngineStatus::SeriesFailed, input, seriesFaults);
@@ -60,16 +67,19 @@ EngineStatus EngineRun::Execute(const KvfTree* tree, KvfHandle* output) {
                     {"the values of the series are too close together to be told apart"});
     TellWarnings(SeriesWarnings(input, *series));
     const auto combinations = AnalyseAll(input, *series);
+    // The reports, which say why, are in place; a page of nothing but missing numbers helps nobody.
     if (HaveAllFailed(combinations)) {
         log.Error("none of the combinations could be fitted");
         return EngineStatus::SeriesFailed;
     }
+    // Built aside: when memory ends half way, the caller's tree is still empty.
     KvfHandle results = kvfCreate();
     WriteResultTree(input, *series, combinations, results.get());
     *output = std::move(results);
     return log.HasWarnings() ? EngineStatus::DoneWithWarnings : EngineStatus::Done;
 }
 
+// Log and reports say the same.
 EngineStatus EngineRun::Fail(EngineStatus status, const EngineInput& input,
                              const Sentences& faults) {
     Sentences told;
@@ -92,6 +102,8 @@ std::vector<CombinationResults> EngineRun::AnalyseAll(const EngineInput& input,
     for (std::size_t i = 0; i < input.combinations.size(); ++i) {
         CombinationAnalysis analysis = AnalyseCombination(input, series, input.combinations[i]);
         Tell(LabelOf(input.combinations[i], i), series, analysis.results);
+        // Written one by one, and the plot with its n ranks dropped then: a report of thirty
+        // combinations is larger than all else in memory.
         goodness.Write(GoodnessReportOf(input, i, analysis));
         quantiles.Write(QuantileReportOf(input, i, series, analysis.results));
         combinations.push_back(std::move(analysis.results));
@@ -105,7 +117,7 @@ void EngineRun::Tell(const std::string& label, const SeriesResults& series,
                      const CombinationResults& results) {
     if (!results.fit) {
         log.Line(label + ": " + FailureSentence(results.fit.Failure()));
-        log.NoteWarning();
+        log.NoteWarning(); // the run as a whole goes on
         return;
     }
     log.Line(label + ": ok");

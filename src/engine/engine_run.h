@@ -20,12 +20,15 @@ class EngineRun {
     EngineStatus Execute(const KvfTree* tree, KvfHandle* output);
 
   private:
+    EngineStatus Analyse(const EngineInput& input, KvfHandle* output);
     EngineStatus Fail(EngineStatus status, const EngineInput& input, const Sentences& faults);
+    /// Both reports are complete afterwards.
     std::vector<CombinationResults> AnalyseAll(const EngineInput& input,
                                                const SeriesResults& series);
     void Tell(const std::string& label, const SeriesResults& series,
               const CombinationResults& results);
     void TellWarnings(const Sentences& warnings);
+    /// Puts a report in its place; the log tells where that fails.
     void FinishReport(ReportFile& report, const char* name);
 
     RunLog& log;

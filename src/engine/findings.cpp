@@ -13,13 +13,15 @@ using stats::ResampledQuantile;
 using stats::ResampledQuantiles;
 
 template <typename Test>
+// The result tree has no place for the reason.
 void AddObstacle(Sentences& warnings, const char* name, const std::optional<Test>& test) {
     if (test && !test->score.IsMade())
         warnings.push_back(std::string(name) + " not made: " +
                            std::string(stats::TestObstacleText(test->score.obstacle)));
 }
 
-/// The period that an event of exceedance 1 would have.
+/// The period that an event of exceedance 1 would have. With Poisson arrivals a year has an event
+/// at all with probability 1 - exp(-rate).
 double ShortestPeriod(const EngineInput& input) {
     if (input.frame.kind == stats::SeriesKind::AnnualMaximum)
         return 1;
@@ -28,6 +30,8 @@ double ShortestPeriod(const EngineInput& input) {
                : 1 / input.frame.rate;
 }
 
+// Samples of few events have no quantile at a short period; too many of them leave it without
+// average.
 std::size_t CountWithoutAverage(const std::vector<ResampledQuantile>& quantiles) {
     return static_cast<std::size_t>(
         std::count_if(quantiles.begin(), quantiles.end(), [](const ResampledQuantile& quantile) {
@@ -44,9 +48,11 @@ std::size_t CountLost(const SeriesResults& series, const ResampledQuantiles& fou
     return count;
 }
 
+// One warning for each cause: where too few resamples could be fitted, every period lacks its
+// average for that reason.
 void AddUncertaintyWarnings(Sentences& warnings, const std::string& label,
                             const ResampledQuantiles& found) {
-    if (found.asked == 0)
+    if (found.asked == 0) // no uncertainty was wanted
         return;
     if (found.kept < found.needed) {
         warnings.push_back(label + ": no uncertainty: only " + std::to_string(found.kept) + " of " +

@@ -9,6 +9,8 @@ namespace ryn {
 
 namespace {
 
+// Those of the values, for partial durations too: users compare them with their own table of peaks,
+// not with one of exceedances.
 void AppendStatistics(std::string& text, const stats::SampleStatistics& statistics) {
     AppendHeading(text, "Sample statistics", '-');
     text +=
@@ -29,6 +31,7 @@ void AppendStatistics(std::string& text, const stats::SampleStatistics& statisti
     AppendValue(text, "L-kurtosis", SixDigits(statistics.lKurtosis));
 }
 
+// Results hold the level as a fraction; people read percent, as on the page of the tests.
 void AppendScore(std::string& text, const stats::TestScore& score) {
     if (!score.IsMade()) {
         text += "  Not made: " + std::string(stats::TestObstacleText(score.obstacle)) + ".\n";
@@ -38,33 +41,46 @@ void AppendScore(std::string& text, const stats::TestScore& score) {
     AppendValue(text, "Significance level [%]", SixDigits(100 * score.level));
 }
 
+// Wald and Wolfowitz (1940).
+void AppendRunTest(std::string& text, const stats::RunTest& test) {
+    text += "\nRun test: z < 0 means too few runs, as a trend or persistence makes them\n";
+    AppendValue(text, "Runs", std::to_string(test.runs));
+    AppendValue(text, "Values above the median", std::to_string(test.above));
+    AppendValue(text, "Values below the median", std::to_string(test.below));
+    AppendScore(text, test.score);
+}
+
+// Mann (1945), Kendall (1975).
+void AppendTrendTest(std::string& text, const stats::TrendTest& test) {
+    text += "\nTest for trend (Mann-Kendall): z > 0 means rising\n";
+    AppendValue(text, "S", std::to_string(test.s));
+    AppendValue(text, "Variance of S", SixDigits(test.variance));
+    AppendScore(text, test.score);
+}
+
+// Wilcoxon (1945), Mann and Whitney (1947).
+void AppendShiftTest(std::string& text, const stats::ShiftTest& test) {
+    text += "\nTest for shift in mean (rank sums): z > 0 means that subsample 1 is higher\n";
+    AppendValue(text, "Values in subsample 1", std::to_string(test.first));
+    AppendValue(text, "Values in subsample 2", std::to_string(test.second));
+    AppendValue(text, "Rank sum of subsample 1", SixDigits(test.rankSum));
+    AppendScore(text, test.score);
+}
+
 void AppendTests(std::string& text, const SeriesResults& series) {
     if (!series.run && !series.trend && !series.shift)
         return;
     AppendHeading(text, "Independence and homogeneity", '-');
     text += "z is standard normal for an independent, homogeneous series; levels are two-sided.\n";
-    if (series.run) {
-        text += "\nRun test: z < 0 means too few runs, as a trend or persistence makes them\n";
-        AppendValue(text, "Runs", std::to_string(series.run->runs));
-        AppendValue(text, "Values above the median", std::to_string(series.run->above));
-        AppendValue(text, "Values below the median", std::to_string(series.run->below));
-        AppendScore(text, series.run->score);
-    }
-    if (series.trend) {
-        text += "\nTest for trend (Mann-Kendall): z > 0 means rising\n";
-        AppendValue(text, "S", std::to_string(series.trend->s));
-        AppendValue(text, "Variance of S", SixDigits(series.trend->variance));
-        AppendScore(text, series.trend->score);
-    }
-    if (series.shift) {
-        text += "\nTest for shift in mean (rank sums): z > 0 means that subsample 1 is higher\n";
-        AppendValue(text, "Values in subsample 1", std::to_string(series.shift->first));
-        AppendValue(text, "Values in subsample 2", std::to_string(series.shift->second));
-        AppendValue(text, "Rank sum of subsample 1", SixDigits(series.shift->rankSum));
-        AppendScore(text, series.shift->score);
-    }
+    if (series.run)
+        AppendRunTest(text, *series.run);
+    if (series.trend)
+        AppendTrendTest(text, *series.trend);
+    if (series.shift)
+        AppendShiftTest(text, *series.shift);
 }
 
+// With its classes: whether the misfit sits in the tail or in the middle is what the sum hides.
 void AppendChiSquared(std::string& text, const stats::ChiSquaredTest& test) {
     text += "\nChi-squared test, classes of equal probability\n";
     AppendRow(text,
@@ -80,6 +96,7 @@ void AppendChiSquared(std::string& text, const stats::ChiSquaredTest& test) {
     AppendValue(text, "Level [%]", SixDigits(test.level));
 }
 
+// D alone does not say where the curve leaves the sample.
 void AppendKolmogorovSmirnov(std::string& text, const stats::KolmogorovSmirnovTest& test) {
     text += "\nKolmogorov-Smirnov test\n";
     AppendValue(text, "D", SixDigits(test.statistic));
@@ -90,6 +107,8 @@ void AppendKolmogorovSmirnov(std::string& text, const stats::KolmogorovSmirnovTe
     AppendValue(text, "Level [%]", SixDigits(test.level));
 }
 
+// The two variates are the criterion's scale: without them it cannot be compared with one computed
+// from other quantiles.
 void AppendPlotMeasures(std::string& text, const FitMeasureRequests& asked,
                         const FitMeasures& found) {
     if (asked.leastSquares) {
@@ -107,6 +126,7 @@ void AppendPlotMeasures(std::string& text, const FitMeasureRequests& asked,
         AppendValue(text, "II (reduced variates)", SixDigits(found.reducedCorrelation));
 }
 
+// What was not asked for was not computed: it is left out rather than shown as 0.
 void AppendMeasures(std::string& text, const FitMeasureRequests& asked,
                     const CombinationResults& results) {
     const FitMeasures& found = results.measures;
@@ -117,11 +137,13 @@ void AppendMeasures(std::string& text, const FitMeasureRequests& asked,
     AppendPlotMeasures(text, asked, found);
     if (!asked.logLikelihood)
         return;
+    // Akaike (1974): likelihoods alone favour the distribution with more parameters.
     text += "\nLikelihood\n";
     AppendValue(text, "Log-likelihood", SixDigits(found.logLikelihood));
     AppendValue(text, "Akaike's criterion", SixDigits(stats::AkaikeCriterion(*results.fit)));
 }
 
+// The numbers behind the probability plot, for users who draw their own.
 void AppendPlot(std::string& text, const stats::Distribution& fitted,
                 const stats::ProbabilityPlot& plot) {
     text +=
@@ -140,6 +162,7 @@ void AppendPlot(std::string& text, const stats::Distribution& fitted,
 std::string GoodnessReportHead(const EngineInput& input, const SeriesResults& series) {
     std::string text = ReportHead(kGoodnessReportSubject, input);
     const std::string unit = PlainName(input.labels.unit);
+    // A level is easily taken for the probability that the distribution is right.
     text +=
         "Values, bounds and quantiles are in " + (unit.empty() ? "the series' unit" : unit) +
         ".\n\nThe levels of the chi-squared and Kolmogorov-Smirnov tests take the parameters as "

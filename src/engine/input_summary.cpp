@@ -12,6 +12,7 @@ namespace {
 
 using stats::SeriesKind;
 
+// Names come from data files of any origin.
 std::string SeriesLine(const EngineInput& input) {
     const std::string name = PlainName(input.labels.itemName);
     const std::string unit = PlainName(input.labels.unit);
@@ -20,6 +21,7 @@ std::string SeriesLine(const EngineInput& input) {
            " values";
 }
 
+// A rate comes from a count over a record length and has more digits than meaning.
 std::string KindLine(const EngineInput& input) {
     if (input.frame.kind == SeriesKind::AnnualMaximum)
         return "Kind: annual maxima";
@@ -27,8 +29,9 @@ std::string KindLine(const EngineInput& input) {
            ", " + NumberText(input.averageNumber) + " events a year";
 }
 
+// Whether T counts events or annual maxima moves a quantile by much at short periods.
 std::string PeriodsLine(const EngineInput& input) {
-    constexpr std::size_t kMostShown = 30;
+    constexpr std::size_t kMostShown = 30; // a line that can still be read
     std::string line = "Return periods in years: ";
     const std::size_t shown = std::min(input.periods.size(), kMostShown);
     for (std::size_t i = 0; i < shown; ++i)
@@ -43,6 +46,7 @@ std::string PeriodsLine(const EngineInput& input) {
     return line;
 }
 
+// With what somebody needs who wants the same numbers from another program.
 std::string UncertaintyLine(UncertaintyMethod method) {
     const stats::MonteCarloSettings settings;
     switch (method) {
@@ -83,6 +87,7 @@ constexpr std::array<std::string_view, 4> kLogNormalNames = {
     "bias correction of skewness I", "bias correction of skewness II",
     "lower bound quantile method I", "lower bound quantile method II"};
 
+// What was done and not what the option says, which some methods and kinds of series overrule.
 std::string LocationText(const stats::Combination& combination, SeriesKind kind) {
     if (stats::EffectiveLocation(combination, kind) == stats::LocationType::Estimated)
         return ", location estimated";

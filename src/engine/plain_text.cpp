@@ -23,6 +23,7 @@ bool BreaksLine(std::string_view character) {
 
 } // namespace
 
+// One character for each, so that nothing a name holds moves what stands behind it.
 std::string PlainText(std::string_view text) {
     std::string line;
     line.reserve(text.size());
@@ -44,6 +45,7 @@ std::string PlainName(std::string_view name) {
     constexpr std::size_t kLongest = 160;
     if (name.size() <= kLongest)
         return PlainText(name);
+    // Cut between characters: half of one would show as a question mark.
     std::size_t end = 0;
     while (true) {
         const std::size_t length = KvfUtf8Length(name, end);
@@ -55,6 +57,7 @@ std::string PlainName(std::string_view name) {
 }
 
 std::string NumberText(double value) {
+    // Beyond the range of floats the cast has no defined result.
     if (std::fabs(value) > static_cast<double>(std::numeric_limits<float>::max()))
         return ShortestText(value);
     return ShortestText(static_cast<float>(value));

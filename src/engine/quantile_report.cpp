@@ -9,6 +9,8 @@ namespace ryn {
 
 namespace {
 
+// The two methods give their names to different things: the jackknife's average is corrected for
+// bias, that of Monte Carlo shows it.
 std::string_view MethodNotes(UncertaintyMethod method) {
     switch (method) {
     case UncertaintyMethod::MonteCarlo:
@@ -28,6 +30,8 @@ std::string_view MethodNotes(UncertaintyMethod method) {
     return "No averages and deviations were asked for.\n";
 }
 
+// The bounds are symmetric and thus too narrow above for a heavy tail, which the head says; the
+// deviation is what the pages show.
 void AppendQuantile(std::string& text, double period, double exceedance,
                     const stats::ResampledQuantile& quantile) {
     constexpr double kNormal95 = 1.96; // half width of the central 95 % in standard deviations
@@ -38,6 +42,7 @@ void AppendQuantile(std::string& text, double period, double exceedance,
                      SixDigits(quantile.estimate + margin)});
 }
 
+// Many failures make the deviation that of the milder samples.
 void AppendResamples(std::string& text, UncertaintyMethod method,
                      const stats::ResampledQuantiles& quantiles) {
     if (method == UncertaintyMethod::None)
@@ -50,18 +55,20 @@ void AppendResamples(std::string& text, UncertaintyMethod method,
 
 std::string QuantileReportHead(const EngineInput& input) {
     const std::string unit = PlainName(input.labels.unit);
+    // For partial durations e is not 1/T, which readers of annual maxima expect.
     return ReportHead(kQuantileReportSubject, input) + "Events are in " +
            (unit.empty() ? "the series' unit" : unit) + ", T in years; e is the probability that " +
            (input.frame.kind == stats::SeriesKind::AnnualMaximum ? "the maximum of a year"
                                                                  : "a peak above the threshold") +
            "\nexceeds the T-year event.\n\n" + std::string(MethodNotes(input.uncertainty)) +
-           "lower and upper: estimate -+ 1.96 deviations, some 95 % where estimates are normal.\n";
+           "lower and upper: estimate -+ 1.96 deviations, some 95 % where estimates are normal; "
+           "those of a heavy\ntail are skewed, so that upper is too low.\n";
 }
 
 std::string QuantileReportOf(const EngineInput& input, std::size_t index,
                              const SeriesResults& series, const CombinationResults& results) {
     std::string text = CombinationHead(input, index, results);
-    if (!results.fit)
+    if (!results.fit) // the head says why
         return text;
     text += '\n';
     AppendRow(text, {"T", "e", "estimate", "average", "bias", "deviation", "lower", "upper"});

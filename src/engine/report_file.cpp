@@ -9,7 +9,7 @@ ReportFile::ReportFile(const std::string& directory, const std::string& name)
 }
 
 void ReportFile::Write(std::string_view text) {
-    if (wanted && opened)
+    if (wanted && opened) // the reason is told once, at the end
         file.Write(text);
 }
 

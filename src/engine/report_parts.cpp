@@ -8,6 +8,7 @@ namespace ryn {
 
 namespace {
 
+// Half of the literature writes the shape with the other sign.
 constexpr std::string_view kReadingNotes =
     "\"-\" stands for a number that does not exist. xi is a location or lower bound, alpha a "
     "scale\n"
@@ -15,6 +16,7 @@ constexpr std::string_view kReadingNotes =
     "extreme value and generalised Pareto distributions has Hosking's sign: kappa > 0 means an\n"
     "upper bound, kappa < 0 a heavy tail (the shape in Coles (2001) is -kappa).\n";
 
+// No date: two runs over the same tree give the same report.
 std::string Title(std::string_view subject, const EngineInput& input) {
     std::string text;
     AppendHeading(text, subject, '=');
@@ -25,6 +27,7 @@ std::string Title(std::string_view subject, const EngineInput& input) {
     return text + "\n";
 }
 
+// The given ones too: an exceedance without its threshold is no level.
 void AppendParameters(std::string& text, const stats::FittedModel& model) {
     for (const stats::Parameter& parameter : stats::Parameters(model.distribution))
         AppendValue(text, std::string(parameter.symbol) + (parameter.estimated ? "" : " (given)"),
@@ -40,6 +43,7 @@ std::string ReportHead(std::string_view subject, const EngineInput& input) {
     return text + "\n" + std::string(kReadingNotes);
 }
 
+// Without the summary of the set-up, of which only parts may have been read.
 std::string ReportOfFailure(std::string_view subject, const EngineInput& input,
                             const Sentences& faults) {
     std::string text = Title(subject, input) + "The series could not be analysed:\n";

@@ -11,6 +11,7 @@ namespace ryn {
 namespace {
 
 constexpr int kDigits = 6;
+// A sign, six digits in fixed notation down to 0.0001, and two blanks between columns.
 constexpr std::size_t kColumnWidth = 15;
 constexpr std::size_t kNameWidth = 26;
 
@@ -21,6 +22,7 @@ int PowerAfterRounding(double value) {
     return std::fabs(value) >= next * (1 - 0.5 * std::pow(10.0, -kDigits)) ? power + 1 : power;
 }
 
+// A cell too long for its column still stands apart from the one before.
 void AppendRight(std::string& text, std::string_view cell, std::size_t width) {
     text.append(cell.size() < width ? width - cell.size() : 1, ' ');
     text += cell;
@@ -28,12 +30,14 @@ void AppendRight(std::string& text, std::string_view cell, std::size_t width) {
 
 } // namespace
 
+// By to_chars, which knows no locale, and at the speed that 10^5 ranks want.
 std::string SixDigits(double value) {
     if (std::isnan(value))
         return "-";
     std::array<char, 64> buffer{};
     char* const end = buffer.data() + buffer.size();
     const int power = value == 0 || std::isinf(value) ? 0 : PowerAfterRounding(value);
+    // Levels and discharges in people's own notation; beyond, zeros would have to be counted.
     const bool isFixed = power >= -4 && power <= 8;
     const auto written =
         std::to_chars(buffer.data(), end, value,

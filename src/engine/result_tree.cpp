@@ -11,6 +11,7 @@ namespace {
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 
 /// A section for as long as the object lives.
+/// Its end closes it, so that no early return leaves the rest of the tree one level too deep.
 class OpenSection {
   public:
     OpenSection(KvfTree* builtTree, std::string_view name) : tree(builtTree) {
@@ -35,10 +36,12 @@ void PutList(KvfTree* tree, const char* keyword, const Values& values) {
         kvfAddDouble(tree, value);
 }
 
+// Counts are bounded by what is read; a list longer than an int counts cannot get here.
 void PutCount(KvfTree* tree, const char* keyword, std::size_t count) {
     kvfPutParam(tree, keyword, static_cast<int>(count));
 }
 
+// Pages show these on their own; they are handed on as they came.
 void WriteSettings(const SeriesLabels& labels, KvfTree* tree) {
     const OpenSection section(tree, "Settings");
     kvfPutParam(tree, "ItemName", labels.itemName);
@@ -57,6 +60,7 @@ void WriteTest(const std::optional<Test>& test, const char* name, KvfTree* tree)
     kvfPutParam(tree, "SignificanceLevel", made ? test->score.level : 0.0);
 }
 
+// All three always: a page shows a test that was not made as such.
 void WriteTests(const SeriesResults& series, KvfTree* tree) {
     const OpenSection section(tree, "IndependenceHomogeneityTest");
     WriteTest(series.run, "RunTest", tree);
@@ -90,11 +94,13 @@ void WriteSampleStatistics(const EngineInput& input, const SeriesResults& series
     const OpenSection section(tree, "SampleStatistics");
     PutCount(tree, "SampleSize", series.statistics.count);
     kvfPutParam(tree, "bPDS", input.frame.kind == stats::SeriesKind::PartialDuration);
+    // As stored: the frame of annual maxima has no threshold and rate 1.
     kvfPutParam(tree, "Threshold", input.threshold);
     kvfPutParam(tree, "AvgAnNum", input.averageNumber);
     WriteMoments(series.statistics, tree);
 }
 
+// Densities, so that bars and density curves share an axis.
 void WriteHistogram(const stats::Histogram& histogram, KvfTree* tree) {
     const OpenSection section(tree, "Histogram");
     PutCount(tree, "NoIntHistogram", histogram.counts.size());
@@ -103,6 +109,8 @@ void WriteHistogram(const stats::Histogram& histogram, KvfTree* tree) {
     PutList(tree, "FrequencyHistogram", histogram.densities);
 }
 
+// All five formulas, whichever the analysis used for its measures: the page of plotting positions
+// compares them, and finds them by their order.
 void WritePlottingPositions(const std::vector<double>& ascending, KvfTree* tree) {
     const std::size_t count = ascending.size();
     const OpenSection section(tree, "ProbabilityPlotObs");
@@ -119,6 +127,7 @@ void WritePlottingPositions(const std::vector<double>& ascending, KvfTree* tree)
     }
 }
 
+// Three places whatever the distribution has, so that tables line up.
 void WriteParameters(const CombinationResults& results, KvfTree* tree) {
     const OpenSection section(tree, "ParameterEstimates");
     for (std::size_t i = 0; i < 3; ++i) {
@@ -139,6 +148,7 @@ struct Number {
     double value;
 };
 
+/// A measure's flag and its numbers, which are 0 where nobody asked for them.
 void PutMeasure(KvfTree* tree, const char* flag, bool asked,
                 std::initializer_list<Number> numbers) {
     kvfPutParam(tree, flag, asked);
@@ -146,6 +156,8 @@ void PutMeasure(KvfTree* tree, const char* flag, bool asked,
         kvfPutParam(tree, number.keyword, asked ? number.value : 0.0);
 }
 
+// The flags follow the request and not the outcome: the grid batch counts its output items by
+// them, and a failed fit must not shift those that follow.
 void WriteMeasures(const FitMeasureRequests& asked, const FitMeasures& found, KvfTree* tree) {
     const OpenSection section(tree, "GoodnessOfFitStatistics");
     PutMeasure(tree, "ChiSquaredTest", asked.chiSquared,
@@ -168,6 +180,8 @@ void WriteDensities(const std::vector<double>& densities, const char* name, KvfT
     PutList(tree, "PDF", densities);
 }
 
+// One keyword for each of the three numbers, and not one for each quantile: readers take a whole
+// column at once.
 void PutQuantiles(KvfTree* tree, const char* keyword,
                   const std::vector<stats::ResampledQuantile>& quantiles,
                   double stats::ResampledQuantile::*member) {
@@ -196,6 +210,7 @@ void WriteCombination(const FitMeasureRequests& asked, const CombinationResults&
     WriteQuantiles(results.quantiles.atProbabilities, "TyearEventPlot", tree);
 }
 
+// First what all curves share, then the combinations.
 void WriteDistributions(const EngineInput& input, const SeriesResults& series,
                         std::span<const CombinationResults> combinations, KvfTree* tree) {
     const OpenSection section(tree, "DistributionAnalysis");
@@ -203,6 +218,7 @@ void WriteDistributions(const EngineInput& input, const SeriesResults& series,
     PutList(tree, "XvaluePDFPlot", series.curveAbscissae);
     PutCount(tree, "NoItemProbabilityPlot", series.curveProbabilities.size());
     PutList(tree, "ProbabilityPlot", series.curveProbabilities);
+    // As they were asked for, those without an event included: results go by position.
     PutCount(tree, "NoReturnPeriods", input.periods.size());
     PutList(tree, "ReturnPeriods", input.periods);
     for (std::size_t i = 0; i < combinations.size(); ++i) {

@@ -25,6 +25,7 @@ void RunLog::Line(std::string_view text) {
     if (stream == nullptr)
         return;
     const std::string line = PlainText(text) + "\n";
+    // A full disk loses the log and nothing else: results go another way.
     std::fwrite(line.data(), 1, line.size(), stream.get());
     std::fflush(stream.get());
 }
@@ -43,6 +44,7 @@ std::string ProgramText() {
 }
 
 std::string NowText() {
+    // Local time: users look for the run that they have just made.
     const std::time_t now = std::time(nullptr);
     std::tm fields{};
     if (localtime_r(&now, &fields) == nullptr)

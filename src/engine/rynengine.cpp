@@ -12,6 +12,7 @@ namespace ryn {
 
 namespace {
 
+// Every other series would fare the same: a status that ends a batch.
 EngineStatus RunCaught(const KvfTree* tree, KvfHandle* output, const std::string& directory,
                        RunLog& log) {
     try {
@@ -24,7 +25,9 @@ EngineStatus RunCaught(const KvfTree* tree, KvfHandle* output, const std::string
     return EngineStatus::SetUpFailed;
 }
 
+// The last line stands in the log whatever happened in between.
 EngineStatus RunLogged(const KvfTree* tree, KvfHandle* output) {
+    // First of all, so that whatever is wrong with the rest of the tree can be told.
     const std::string directory = EngineDirectory(tree);
     RunLog log(directory);
     log.Line(ProgramText());
@@ -37,6 +40,7 @@ EngineStatus RunLogged(const KvfTree* tree, KvfHandle* output) {
 } // namespace
 
 void RYNENGINE(const KvfHandle* input, KvfHandle* output, std::int32_t* status) noexcept {
+    // Callers cannot catch: the module and its host meet in plain functions.
     auto reached = EngineStatus::SetUpFailed;
     try {
         reached = RunLogged(input == nullptr ? nullptr : input->get(), output);

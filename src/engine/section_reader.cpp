@@ -4,6 +4,7 @@ namespace ryn {
 
 namespace {
 
+// By the type of a value, for whoever has the file in an editor.
 constexpr const char* Wanted(int /*type*/) {
     return "is not a whole number";
 }
@@ -29,15 +30,17 @@ std::string SectionReader::PathOf(std::string_view keyword) const {
 
 template <typename Type>
 Type SectionReader::Optional(const char* keyword, Type fallback) const {
-    if (kvfGetParam(section, keyword, &fallback, 1, 1) == 0 &&
-        kvfKeywordByNameNum(section, keyword, 1) != nullptr)
+    // The store takes a wrong type for nothing found. Here it must not pass for a keyword that an
+    // older file lacks: the run would go on with something that nobody asked for.
+    if (kvfGetParam(section, keyword, &fallback, 1, 1) == 0 && Has(keyword))
         Fault(keyword, Wanted(fallback));
     return fallback;
 }
 
 template <typename Type>
 Type SectionReader::Required(const char* keyword) const {
-    if (section != nullptr && kvfKeywordByNameNum(section, keyword, 1) == nullptr)
+    // A missing section has been told as such.
+    if (section != nullptr && !Has(keyword))
         Fault(keyword, "is missing");
     return Optional(keyword, Type{});
 }
@@ -46,6 +49,7 @@ void SectionReader::Fault(std::string_view keyword, std::string_view rest) const
     noted->push_back(PathOf(keyword) + " " + std::string(rest));
 }
 
+// The types that the engine's input has.
 template int SectionReader::Optional(const char*, int) const;
 template bool SectionReader::Optional(const char*, bool) const;
 template double SectionReader::Optional(const char*, double) const;

@@ -24,6 +24,9 @@ class SectionReader {
     /// A section inside this one; whether it exists is the caller's affair.
     SectionReader Inside(std::string_view child) const;
     bool Exists() const { return section != nullptr; }
+    bool Has(std::string_view keyword) const {
+        return kvfKeywordByNameNum(section, keyword, 1) != nullptr;
+    }
     const KvfSection* Section() const { return section; }
     /// "PATH/KEYWORD"
     std::string PathOf(std::string_view keyword) const;

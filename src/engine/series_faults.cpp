@@ -8,6 +8,7 @@ namespace ryn {
 
 namespace {
 
+// No combination is fitted to fewer.
 constexpr std::size_t kFewestValues = 5;
 
 /// The first value that `isBad` says so of, as its fault; nothing where there is none.
@@ -36,7 +37,7 @@ Sentences SeriesFaults(const EngineInput& input) {
     Sentences faults;
     FindFirst(
         values, [](double x) { return !std::isfinite(x); }, ", which is no number", faults);
-    if (!faults.empty())
+    if (!faults.empty()) // comparisons with NaN would add nonsense
         return faults;
     if (std::equal(values.begin() + 1, values.end(), values.begin()))
         faults.push_back("all values of the series are equal (" + NumberText(values.front()) + ")");

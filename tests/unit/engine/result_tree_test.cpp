@@ -44,7 +44,7 @@ void Add(Lines& lines, const std::string& section, const std::string& keywords,
          const std::string& countAndType) {
     std::istringstream names(keywords);
     for (std::string name; names >> name;)
-        lines.push_back("RYNoutput/" + section + "/" + name + " " + countAndType);
+        lines.emplace_back("RYNoutput/" + section).append("/" + name).append(" " + countAndType);
 }
 
 std::string Doubles(int count) {
