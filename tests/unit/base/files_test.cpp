@@ -1,4 +1,3 @@
-#include <csignal>
 #include <filesystem>
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -9,7 +8,6 @@
 
 #include "base/atomic_file.h"
 #include "base/file_access.h"
-#include "base/temporary_files.h"
 #include "support/temporary_directory.h"
 
 namespace ryn {
@@ -132,22 +130,6 @@ TEST(FileAccess, KnowsAFileByItsOtherName) {
     std::filesystem::create_symlink("a.txt", directory.Root() / "b.txt");
     EXPECT_TRUE(IsSameFile(path, directory.Path("b.txt")));
     EXPECT_FALSE(IsSameFile(path, directory.Path("none")));
-}
-
-TEST(AtomicFileDeathTest, AnInterruptTakesTheTemporaryFileAlong) {
-    const TemporaryDirectory directory;
-    const std::string path = directory.Write("a", "old");
-    EXPECT_EXIT(
-        {
-            RemoveTemporariesOnSignals();
-            AtomicFile file;
-            (void)file.Open(path);
-            file.Write("half");
-            std::raise(SIGTERM);
-        },
-        ::testing::KilledBySignal(SIGTERM), "");
-    EXPECT_EQ(directory.Read("a"), "old");
-    EXPECT_EQ(directory.EntryCount(), 1U);
 }
 
 } // namespace
