@@ -7,10 +7,8 @@
 #include <random>
 #include <sys/stat.h>
 #include <unistd.h>
-#include <utility>
 
 #include "base/path_parts.h"
-#include "base/temporary_files.h"
 
 namespace ryn {
 
@@ -85,7 +83,6 @@ Status AtomicFile::Open(const std::string& path) {
     if (fd < 0)
         return Status::FromErrno(path, errno);
     temporary = name;
-    noted = NoteTemporary(temporary);
     target = resolved;
     writeError = 0;
     if (replaces)
@@ -126,7 +123,6 @@ Status AtomicFile::Commit(Durability durability) {
         Discard();
         return Status::FromErrno(name, error);
     }
-    ForgetTemporary(std::exchange(noted, -1));
     temporary.clear();
     if (durability == Durability::Flushed)
         FlushDirectory(SplitPath(target).directory);
@@ -137,7 +133,6 @@ void AtomicFile::Discard() {
     stream.reset();
     if (!temporary.empty())
         ::unlink(temporary.c_str());
-    ForgetTemporary(std::exchange(noted, -1));
     temporary.clear();
 }
 

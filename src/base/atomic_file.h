@@ -20,9 +20,8 @@ enum class Durability {
 /// file. A target that exists and is no regular file is refused. An existing target's permissions
 /// are kept.
 ///
-/// Without Commit the destructor removes what was written, and in a program that has called
-/// RemoveTemporariesOnSignals an interrupt does. SIGKILL leaves a hidden file ".NAME.XXXXXX" beside
-/// the target.
+/// Without Commit the destructor removes what was written. A kill leaves a hidden file
+/// ".NAME.XXXXXX" beside the target.
 class AtomicFile {
   public:
     AtomicFile() = default;
@@ -49,7 +48,6 @@ class AtomicFile {
 
     std::string target;    // after following links
     std::string temporary; // beside it
-    int noted = -1;        // its number among the process's temporary files
     std::unique_ptr<std::FILE, CloseStream> stream;
     int writeError = 0;
 };

@@ -31,15 +31,15 @@ void NameItems(const ImportSettings& settings, const std::string& fallbackName,
                ImportReport* report) {
     for (std::size_t i = 0; i < report->items.size(); ++i) {
         ImportedItem& item = report->items[i];
-        if (i < settings.names.size())
-            item.name = settings.names[i];
+        if (!settings.name.empty() && report->items.size() == 1)
+            item.name = settings.name;
         if (item.name.empty())
             // A series needs a name on plots; the table's own file name is what its owner knows it
             // by.
             item.name = report->items.size() == 1 ? fallbackName
                                                   : fallbackName + " " + std::to_string(i + 1);
-        if (!settings.units.empty())
-            item.unit = settings.units.size() == 1 ? settings.units[0] : settings.units[i];
+        if (!settings.unit.empty())
+            item.unit = settings.unit;
     }
 }
 

@@ -1,7 +1,5 @@
 #include "import/import_options.h"
 
-#include <algorithm>
-
 #include "import/number_field.h"
 #include "import/table_text.h"
 
@@ -147,14 +145,6 @@ Status ParseEncoding(const std::string& text, std::optional<TextEncoding>* encod
                          "utf-8, latin-1, windows-1252, utf-16le, utf-16be, shift_jis or euc-jp");
 }
 
-/// Names and units belong to the items in their order, so that there are none or as many.
-Status TestCount(const std::string& option, std::size_t count, std::size_t items) {
-    if (count == 0 || count == items)
-        return Status::Ok();
-    return Status::InputFault(option + " is given " + std::to_string(count) +
-                              " times, and the number of items is " + std::to_string(items));
-}
-
 } // namespace
 
 /// The settings are taken over only when every option is understood.
@@ -162,19 +152,16 @@ Status ParseImportOptions(const ImportOptions& options, ImportSettings* settings
     ImportSettings parsed;
     parsed.timeColumns = options.timeColumns;
     parsed.itemColumns = options.itemColumns;
-    parsed.units = options.units;
-    parsed.names = options.names;
+    parsed.unit = options.unit;
+    parsed.name = options.name;
     parsed.skipLines = options.skipLines > 0 ? options.skipLines : 0;
     parsed.order = options.sort ? RowOrder::Any : RowOrder::MustRise;
     if (!options.comment.empty())
         parsed.commentMarks.push_back(options.comment);
     ParseMissing(options.missing, &parsed.missing);
-    const std::size_t items = std::max<std::size_t>(options.itemColumns.size(), 1);
-    Status status = TestCount("--name", options.names.size(), items);
-    if (status && options.units.size() > 1)
-        status = TestCount("--unit", options.units.size(), items);
-    if (status)
-        status = ParseDelimiter(options.delimiter, &parsed.delimiter);
+    if (options.itemColumns.size() > 1 && !options.name.empty())
+        return Status::InputFault("--name names one item, and there are several --item");
+    Status status = ParseDelimiter(options.delimiter, &parsed.delimiter);
     if (status)
         status = ParseDecimal(options.decimal, &parsed.decimal);
     if (status)

@@ -17,16 +17,16 @@ namespace ryn {
 struct ImportOptions {
     std::vector<std::string> timeColumns; ///< names or numbers from 1; several are joined
     std::vector<std::string>
-        itemColumns;                ///< names or numbers from 1; empty: the first with numbers
-    std::vector<std::string> units; ///< one of every item, or one for each
-    std::vector<std::string> names; ///< one for each item
-    std::string delimiter;          ///< one character, or comma, semicolon, tab, bar, blank
-    std::string decimal;            ///< "." or ","
-    std::string comment;            ///< lines that begin so are passed over
-    std::string encoding;           ///< "utf-8", "latin-1", "shift_jis", ...
-    std::string timeFormat;         ///< as for TimePattern, or excel, unix, decimal-year, year
-    std::string start; ///< with step the axis itself; alone, parts that the columns lack
-    std::string step;  ///< as for ParseTimeStep
+        itemColumns;        ///< names or numbers from 1; empty: the first with numbers
+    std::string unit;       ///< of every item
+    std::string name;       ///< of the item; with several items a fault
+    std::string delimiter;  ///< one character, or comma, semicolon, tab, bar, blank
+    std::string decimal;    ///< "." or ","
+    std::string comment;    ///< lines that begin so are passed over
+    std::string encoding;   ///< "utf-8", "latin-1", "shift_jis", ...
+    std::string timeFormat; ///< as for TimePattern, or excel, unix, decimal-year, year
+    std::string start;      ///< with step the axis itself; alone, parts that the columns lack
+    std::string step;       ///< as for ParseTimeStep
     std::vector<std::string>
         missing;        ///< codes and marks; "none" alone turns the search for codes off
     long skipLines = 0; ///< lines at the start that are no part of the table
@@ -56,8 +56,8 @@ struct ImportSettings {
     std::vector<std::string> timeColumns;
     std::vector<std::string> itemColumns;
     std::vector<std::string> commentMarks; ///< empty: the usual ones
-    std::vector<std::string> units;
-    std::vector<std::string> names;
+    std::string unit;
+    std::string name;
     MissingRules missing;
     long skipLines = 0;
     RowOrder order = RowOrder::MustRise;

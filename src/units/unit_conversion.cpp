@@ -78,10 +78,6 @@ bool IsTableUnit(int code) {
     return FindUnitRow(code) != nullptr;
 }
 
-bool IsKnownUnit(std::string_view text) {
-    return UnitRegistry::Instance().Knows(text);
-}
-
 Status UnitDatabaseStatus() {
     return UnitRegistry::Instance().LibraryLoaded();
 }

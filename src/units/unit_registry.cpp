@@ -68,13 +68,6 @@ int UnitRegistry::CodeOf(std::string_view text) {
     return code;
 }
 
-bool UnitRegistry::Knows(std::string_view text) {
-    if (FindUnitRow(CodeOf(text)) != nullptr)
-        return true;
-    const std::lock_guard lock(mutex);
-    return Library().Knows(text);
-}
-
 const UnitConverter* UnitRegistry::ConverterFor(int from, int to) {
     const auto [place, isNew] = converters.try_emplace({from, to});
     if (isNew)

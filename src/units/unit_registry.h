@@ -21,7 +21,6 @@ class UnitRegistry {
 
     std::string TextOf(int code);
     int CodeOf(std::string_view text);
-    bool Knows(std::string_view text);
     /// Converts by UDUNITS; nothing when there is no conversion.
     std::optional<double> Convert(int from, int to, double value);
     Status LibraryLoaded();

@@ -1,14 +1,12 @@
 #include "apps/cli/case_arguments.h"
 
 #include <algorithm>
-#include <cmath>
 #include <memory>
 #include <string_view>
 
 #include "apps/cli/nearest_names.h"
 #include "apps/cli/setting_value.h"
 #include "apps/cli/settings.h"
-#include "base/number_text.h"
 #include "params/combination_name.h"
 #include "strings/catalogue.h"
 
@@ -68,10 +66,6 @@ Status ReplacePeriods(CAnalysisKvf& analysis, const std::optional<std::string>& 
     if (!numbers)
         return Status::InputFault(FormatText(kTextCliBadValue, std::string("--periods"), *periods,
                                              std::string(Text(kTextCliExpectNumbers))));
-    // What no series can have. The smallest that this one can have is for `check` to tell.
-    for (const double period : *numbers)
-        if (!std::isfinite(period) || period <= 0.0)
-            return Status::InputFault(FormatText(kTextCliBadPeriod, ShortestText(period)));
     analysis.EvaluatedReturnPeriods = *numbers;
     return Status::Ok();
 }

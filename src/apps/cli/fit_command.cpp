@@ -1,7 +1,5 @@
 #include "apps/cli/fit_command.h"
 
-#include <algorithm>
-#include <functional>
 #include <iterator>
 #include <memory>
 #include <ostream>
@@ -9,7 +7,6 @@
 #include "apps/cli/case_arguments.h"
 #include "apps/cli/command_options.h"
 #include "apps/cli/fit_report.h"
-#include "apps/cli/fit_texts.h"
 #include "apps/cli/input_file.h"
 #include "apps/cli/number_column.h"
 #include "apps/cli/setting_value.h"
@@ -18,7 +15,6 @@
 #include "series/tsq_values.h"
 #include "stats/return_period.h"
 #include "strings/catalogue.h"
-#include "units/units.h"
 
 namespace ryn::cli {
 
@@ -34,7 +30,6 @@ struct FitTask {
     stats::SeriesFrame frame;
     std::vector<double> periods;
     std::vector<double> values;
-    std::string unit; ///< of the values, where a data file tells it
 };
 
 stats::Combination CombinationOf(const DieCombination& settings) {
@@ -72,13 +67,12 @@ Status PeriodsOf(const FitOptions& options, const stats::SeriesFrame& frame,
     return Status::Ok();
 }
 
-Status ReadSeriesValues(const FitOptions& options, FitTask* task) {
+Status ReadSeriesValues(const FitOptions& options, std::vector<double>* values) {
     CTsqValues series;
     if (!series.ReadSeries(options.values, options.item.value_or(1) - 1))
         return series.ReadError();
     for (const STSItem& sample : series.samples)
-        task->values.push_back(sample.value);
-    task->unit = UnitText(series.itemUnit);
+        values->push_back(sample.value);
     return Status::Ok();
 }
 
@@ -99,14 +93,14 @@ Status ReadTextValues(const FitOptions& options, Console& console, std::vector<d
     return Status::Ok();
 }
 
-Status ReadValues(const FitOptions& options, Console& console, FitTask* task) {
+Status ReadValues(const FitOptions& options, Console& console, std::vector<double>* values) {
     if (options.values == "-")
-        return ReadTextValues(options, console, &task->values);
+        return ReadTextValues(options, console, values);
     if (Status readable = TestReadable(options.values); !readable)
         return readable;
     return KindOfFile(options.values) == FileKind::DataFile
-               ? ReadSeriesValues(options, task)
-               : ReadTextValues(options, console, &task->values);
+               ? ReadSeriesValues(options, values)
+               : ReadTextValues(options, console, values);
 }
 
 Status MakeTask(const FitOptions& options, Console& console, FitTask* task) {
@@ -120,27 +114,19 @@ Status MakeTask(const FitOptions& options, Console& console, FitTask* task) {
     if (status)
         status = PeriodsOf(options, task->frame, &task->periods);
     if (status)
-        status = ReadValues(options, console, task);
+        status = ReadValues(options, console, &task->values);
     return status;
-}
-
-bool AreAllEqual(const std::vector<double>& values) {
-    return std::adjacent_find(values.begin(), values.end(), std::not_equal_to<>()) == values.end();
 }
 
 FitReport FitTaskOf(const FitTask& task) {
     FitReport report;
     report.name = task.name;
     report.count = task.values.size();
-    report.unit = task.unit;
-    if (task.values.size() > 1 && AreAllEqual(task.values)) { // no moment ratio exists then
-        report.failure = FormatText(kTextCliAllEqual, ShortestText(task.values.front()));
-        return report;
-    }
     const stats::FitInput input{task.values, task.frame};
     const stats::FitResult result = stats::Fit(task.combination, input);
     if (!result) {
-        report.failure = FitFailureText(result.Failure());
+        const std::string code = stats::FailureCode(result.Failure());
+        report.failure = (code.empty() ? "" : code + ": ") + stats::FailureText(result.Failure());
         return report;
     }
     report.model = *result;
@@ -168,7 +154,7 @@ int RunFit(const FitOptions& options, Console& console) {
         return kExitAnalysis;
     }
     for (const stats::FitWarning& warning : report.model->warnings)
-        ShowWarning(console, report.name + ": " + FitWarningText(warning));
+        ShowWarning(console, report.name + ": " + stats::WarningText(warning));
     return kExitDone;
 }
 

@@ -4,7 +4,6 @@
 #include <cmath>
 #include <ostream>
 
-#include "apps/cli/plain_text.h"
 #include "apps/cli/text_table.h"
 #include "base/number_text.h"
 #include "strings/catalogue.h"
@@ -102,8 +101,7 @@ Json JsonOfFit(const FitReport& report) {
 }
 
 void PrintFit(std::ostream& out, const FitReport& report) {
-    out << FormatText(kTextCliFitHeading, report.name, static_cast<int>(report.count))
-        << (report.unit.empty() ? "" : " [" + PlainLine(report.unit) + "]") << "\n\n";
+    out << FormatText(kTextCliFitHeading, report.name, static_cast<int>(report.count)) << "\n\n";
     PrintParameters(out, *report.model);
     out << '\n';
     PrintQuantiles(out, report.quantiles);

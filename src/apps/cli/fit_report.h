@@ -21,7 +21,6 @@ struct FitQuantile {
 struct FitReport {
     std::string name;
     std::size_t count = 0;
-    std::string unit;    ///< of the values; empty where it is not known
     std::string failure; ///< empty: fitted
     std::optional<stats::FittedModel> model;
     std::vector<FitQuantile> quantiles;

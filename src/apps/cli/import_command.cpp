@@ -9,9 +9,7 @@
 #include "apps/cli/plain_text.h"
 #include "base/file_access.h"
 #include "import/import.h"
-#include "import/unit_text.h"
 #include "strings/catalogue.h"
-#include "units/units.h"
 
 namespace ryn::cli {
 
@@ -28,8 +26,8 @@ Status TestFiles(const ImportCommandOptions& options) {
 void AddColumnOptions(CLI::App& command, ImportOptions* table) {
     AddListOption(command, {"--time", "COL", kTextCliHelpImportTime}, &table->timeColumns);
     AddListOption(command, {"--item", "COL", kTextCliHelpImportItem}, &table->itemColumns);
-    AddListOption(command, {"--unit", "U", kTextCliHelpImportUnit}, &table->units);
-    AddListOption(command, {"--name", "N", kTextCliHelpImportName}, &table->names);
+    AddPlainTextOption(command, {"--unit", "U", kTextCliHelpImportUnit}, &table->unit);
+    AddPlainTextOption(command, {"--name", "N", kTextCliHelpImportName}, &table->name);
 }
 
 void AddLayoutOptions(CLI::App& command, ImportOptions* table) {
@@ -59,9 +57,6 @@ int RunImport(const ImportCommandOptions& options, Console& console) {
     const Status imported = ImportFile(options.input, options.output, options.table, &report);
     if (!imported)
         return Report(console, imported);
-    for (const std::string& unit : options.table.units)
-        if (!IsKnownUnit(PlainUnit(unit)))
-            ShowWarning(console, FormatText(kTextCliUnknownUnit, unit));
     if (options.form == OutputForm::Json) {
         PrintJson(console, JsonOfImport(report));
         return kExitDone;

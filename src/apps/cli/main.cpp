@@ -9,7 +9,6 @@
 
 #include "apps/cli/descriptor_output.h"
 #include "apps/cli/run_ryn.h"
-#include "base/temporary_files.h"
 #include "strings/catalogue.h"
 
 namespace {
@@ -43,7 +42,6 @@ int main(int argumentCount, char** arguments) {
     std::signal(SIGPIPE, SIG_IGN);
     // Nor a limit on the size of files: the write fails, and what was written is taken away.
     std::signal(SIGXFSZ, SIG_IGN);
-    ryn::RemoveTemporariesOnSignals();
     ryn::cli::DescriptorOutput buffer(STDOUT_FILENO);
     std::ostream out(&buffer);
     ryn::cli::Console console{out, std::cerr, std::cin, ::isatty(STDERR_FILENO) != 0};

@@ -78,7 +78,8 @@ void PrintQuantiles(const COutputSettings& results, std::ostream& out) {
 
 void PrintResults(CaseFile& file, const RunOutcome& outcome, Console& console) {
     const COutputSettings& results = file.Document().Results();
-    console.out << FormatText(kTextCliRunWritten, PlainLine(file.Root().DefineEVS().OutputFileName),
+    console.out << FormatText(kTextCliRunWritten,
+                              PlainLine(file.Root().DefineEVS().OutputFileName),
                               results.SampleStats.SampleSize, results.ItemNames.size())
                 << '\n';
     if (results.ReturnPeriods.empty())
@@ -106,12 +107,15 @@ Json JsonOfRun(CaseFile& file, const RunOutcome& outcome) {
     Json combinations = Json::array();
     const std::vector<SEQItem>& items = results.Quantiles.Items();
     for (std::size_t i = 0; i < std::min(items.size(), results.ItemNames.size()); ++i)
-        combinations.push_back({{"name", results.ItemNames[i]},
-                                {"quantiles", JsonOfQuantiles(items[i], results.ReturnPeriods)}});
-    return {
-        {"status", outcome.engineStatus}, {"resultFile", file.Root().DefineEVS().OutputFileName},
-        {"logFile", outcome.logFile},     {"count", results.SampleStats.SampleSize},
-        {"unit", results.Unit},           {"combinations", std::move(combinations)}};
+        combinations.push_back(
+            {{"name", results.ItemNames[i]},
+             {"quantiles", JsonOfQuantiles(items[i], results.ReturnPeriods)}});
+    return {{"status", outcome.engineStatus},
+            {"resultFile", file.Root().DefineEVS().OutputFileName},
+            {"logFile", outcome.logFile},
+            {"count", results.SampleStats.SampleSize},
+            {"unit", results.Unit},
+            {"combinations", std::move(combinations)}};
 }
 
 /// What stopped the run, as an exit code; its message was shown already.

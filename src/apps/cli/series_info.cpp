@@ -1,6 +1,5 @@
 #include "apps/cli/series_info.h"
 
-#include <algorithm>
 #include <cmath>
 #include <ostream>
 
@@ -40,10 +39,8 @@ void ExtendTimes(SeriesInfo& info, const COleDateTime& date) {
     }
     if (!IsClearlyBefore(info.last, date))
         ++info.backwardSteps;
-    const double step = (date - info.last).GetTotalDays();
     const double longest = (info.gapTo - info.gapFrom).GetTotalDays(); // NaN at the start
-    info.shortestStep = info.gapTo.IsValid() ? std::min(info.shortestStep, step) : step;
-    if (!(step <= longest)) {
+    if (!((date - info.last).GetTotalDays() <= longest)) {
         info.gapFrom = info.last;
         info.gapTo = date;
     }
@@ -68,11 +65,8 @@ int AxisTextId(AxisKind kind) {
     return kTextCliAxisEqRelative + static_cast<int>(kind);
 }
 
-/// Whether all steps are equal, also on an axis that lists them one by one, as files of other
-/// programs do.
-bool IsRegular(const SeriesInfo& info) {
-    constexpr double kHalfSecond = 0.5 / 86400.0;
-    return (info.gapTo - info.gapFrom).GetTotalDays() - info.shortestStep < kHalfSecond;
+bool IsEquidistant(AxisKind kind) {
+    return kind == AxisKind::EquidistantRelative || kind == AxisKind::EquidistantCalendar;
 }
 
 Json JsonOfSample(const DatedValue& sample) {
@@ -121,7 +115,7 @@ void PrintHead(std::ostream& out, const SeriesInfo& info) {
         head.AddRow({TextOf(kTextCliFirst), DateForPeople(info.first)});
         head.AddRow({TextOf(kTextCliLast), DateForPeople(info.last)});
     }
-    if (info.gapFrom.IsValid() && IsRegular(info))
+    if (info.gapFrom.IsValid() && IsEquidistant(info.axis))
         head.AddRow({TextOf(kTextCliTimeStep), LengthForPeople(info.gapTo - info.gapFrom)});
     else if (info.gapFrom.IsValid())
         head.AddRow({TextOf(kTextCliLongestGap), GapText(info)});

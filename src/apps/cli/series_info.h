@@ -36,8 +36,7 @@ struct SeriesInfo {
     COleDateTime last;
     COleDateTime gapFrom; ///< the longest time between two steps that follow each other
     COleDateTime gapTo;
-    double shortestStep = 0.0; ///< days between two such steps
-    int backwardSteps = 0;     ///< steps that do not lie after the one before them
+    int backwardSteps = 0; ///< steps that do not lie after the one before them
     std::vector<ItemExtent> items;
 };
 

@@ -118,21 +118,14 @@ TEST(ImportOption, ChoosesItemsAndKeepsRowsInWhichAllAreThere) {
 
 TEST(ImportOption, NamesTheItemAndItsUnit) {
     ImportOptions options;
-    options.names = {"Discharge"};
-    options.units = {"m3/s"};
+    options.name = "Discharge";
+    options.unit = "m3/s";
     const Imported imported("t,Q [cfs]\n2001-01-01,1\n2001-01-02,2\n", options);
     EXPECT_EQ(imported.report.items[0].name, "Discharge");
     EXPECT_EQ(imported.report.items[0].unit, "m3/s");
-    const std::string two = "t,Q,H\n2001-01-01,1,5\n2001-01-02,2,6\n";
-    options.itemColumns = {"H", "Q"};
-    EXPECT_EQ(Imported(two, options).status.Text(),
-              "--name is given 1 times, and the number of items is 2");
-    options.names = {"Stage", "Discharge"};
-    EXPECT_EQ(Imported(two, options).report.items[0].unit, "m3/s"); // one for all
-    options.units = {"m", "m3/s"};
-    const Imported both(two, options);
-    EXPECT_EQ(both.report.items[0].name + " " + both.report.items[0].unit, "Stage m");
-    EXPECT_EQ(both.report.items[1].name + " " + both.report.items[1].unit, "Discharge m3/s");
+    options.itemColumns = {"1", "2"};
+    EXPECT_EQ(Imported("1,2\n", options).status.Text(),
+              "--name names one item, and there are several --item");
 }
 
 TEST(ImportOption, OverridesDelimiterDecimalCommentAndEncoding) {
