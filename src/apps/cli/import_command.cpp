@@ -2,6 +2,7 @@
 
 #include <memory>
 #include <ostream>
+#include <set>
 
 #include "apps/cli/command_options.h"
 #include "apps/cli/import_json.h"
@@ -9,7 +10,9 @@
 #include "apps/cli/plain_text.h"
 #include "base/file_access.h"
 #include "import/import.h"
+#include "import/unit_text.h"
 #include "strings/catalogue.h"
+#include "units/units.h"
 
 namespace ryn::cli {
 
@@ -48,6 +51,17 @@ void AddRowOptions(CLI::App& command, ImportOptions* table) {
                        &table->duplicates);
 }
 
+/// A unit that nothing can convert is kept, since a later version may know it; but mostly it is
+/// mistyped.
+void NoteUnknownUnits(const ImportReport& report, Console& console) {
+    std::set<std::string> told;
+    for (const ImportedItem& item : report.items) {
+        const std::string unit = PlainUnit(item.unit);
+        if (!unit.empty() && !IsKnownUnit(UnitOfText(unit)) && told.insert(unit).second)
+            ShowNote(console, FormatText(kTextCliUnknownUnit, report.source, unit));
+    }
+}
+
 } // namespace
 
 int RunImport(const ImportCommandOptions& options, Console& console) {
@@ -57,6 +71,7 @@ int RunImport(const ImportCommandOptions& options, Console& console) {
     const Status imported = ImportFile(options.input, options.output, options.table, &report);
     if (!imported)
         return Report(console, imported);
+    NoteUnknownUnits(report, console);
     if (options.form == OutputForm::Json) {
         PrintJson(console, JsonOfImport(report));
         return kExitDone;

@@ -47,7 +47,8 @@ const BadCommandLine kCommands[] = {
     {"NoCommand",
      {},
      1,
-     "ryn: no command is given; there are: import, export, info, new, set, check, extract, run, show, fit "
+     "ryn: no command is given; there are: import, export, info, new, set, check, extract, run, "
+     "show, fit "
      "(ryn --help tells the usage)\n"},
     {"UnknownCommand", {"exprt", "s.tsq0"}, 1, "ryn: unknown command exprt; nearest: export\n"},
     {"UnknownOption",
@@ -173,6 +174,18 @@ const BadCommandLine kValues[] = {
      {"set", "case.ryn", "--periods", "2,,10"},
      1,
      "ryn: --periods: \"2,,10\" is no valid value; expected: numbers with commas between them\n"},
+    {"PeriodThatIsNeverRight",
+     {"new", "case.ryn", "--yes", "--periods", "10,0"},
+     1,
+     "ryn: return period 0 must be greater than 0 years\n"},
+    {"PeriodSetBelowZero",
+     {"set", "case.ryn", "Analysis.EvaluatedReturnPeriods.Item=-2.5"},
+     1,
+     "ryn: return period -2.5 must be greater than 0 years\n"},
+    {"PeriodThatIsNotFinite",
+     {"set", "case.ryn", "--periods", "inf"},
+     1,
+     "ryn: --periods: \"inf\" is no valid value; expected: numbers with commas between them\n"},
     {"GoodThenBad",
      {"set", "case.ryn", "DefineEVS.Title=x", "DefineEVS.Threshold=y"},
      1,

@@ -71,6 +71,17 @@ TEST_F(ImportCommand, MakesAnAxisForATableWithoutTimes) {
     EXPECT_EQ(Json()["last"], "2002-01-02T00:00:00");
 }
 
+TEST_F(ImportCommand, KeepsAUnitThatNobodyKnowsAndSaysSo) {
+    files.Write("t.csv", "time,v [furlong]\n2001-01-01,1\n2001-01-02,2\n");
+    ASSERT_EQ(Run({"import", "t.csv", "o.tsq0"}), 0);
+    EXPECT_EQ(err, "");
+    ASSERT_EQ(Run({"import", "t.csv", "o.tsq0", "--unit", "blah", "--yes"}), 0);
+    EXPECT_EQ(err, "ryn: note: t.csv: unit \"blah\" is not known; it is kept, and cannot be "
+                   "converted\n");
+    ASSERT_EQ(Run({"info", "o.tsq0", "--json"}), 0);
+    EXPECT_EQ(Json()["items"][0]["unit"], "blah");
+}
+
 TEST_F(ImportCommand, WritesNothingWhenARowIsRefused) {
     files.Write("t.csv", "time,v\n2001-01-01,1\n2001-01-03,2\n2001-01-02,3\n");
     EXPECT_EQ(Run({"import", "t.csv", "o.tsq0"}), 1);
