@@ -258,6 +258,7 @@ bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) try {
         read.push_back({date, static_cast<double>(value), 0});
     };
     const bool whole = open.Walk([&](int step, const TsqBlock& block) {
+        ports->progress->ShowProgress(step, open.axis.count);
         if (open.axis.IsEquidistant()) {
             for (int i = 0; i < block.count; ++i)
                 append(open.DateByStep(step + i), block.values[i]);
@@ -267,6 +268,7 @@ bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) try {
         }
         return datesValid;
     });
+    ports->progress->ShowProgress(open.axis.count, open.axis.count);
     if (!whole) {
         readError = datesValid ? tsqTakeError() : TimeOutOfCalendar(path);
         return false;

@@ -47,7 +47,7 @@ struct ExtractionReport {
 /// another program with values marked as missing is refused.
 class CTsqValues {
   public:
-    /// Ways to the outside for what an extraction shows.
+    /// Ways to the outside for what an extraction shows, and for the progress of ReadSeries.
     void UsePorts(const Ports& outside) { ports = &outside; }
 
     /// One pass over an item (index from 0) that keeps count, first, last, smallest and largest
