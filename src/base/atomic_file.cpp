@@ -78,11 +78,9 @@ Status AtomicFile::Open(const std::string& path) {
         return Status::SystemFault(path + ": not a regular file");
     if (replaces && ::access(resolved.c_str(), W_OK) != 0)
         return Status::FromErrno(path, errno); // renaming would pass over a write protection
-    std::string name;
-    const int fd = MakeBeside(SplitPath(resolved), &name);
+    const int fd = MakeTemporary(resolved);
     if (fd < 0)
         return Status::FromErrno(path, errno);
-    temporary = name;
     target = resolved;
     writeError = 0;
     if (replaces)
@@ -95,6 +93,17 @@ Status AtomicFile::Open(const std::string& path) {
         return Status::FromErrno(path, error);
     }
     return Status::Ok();
+}
+
+int AtomicFile::MakeTemporary(const std::string& besideThis) {
+    const SignalsHeld held;
+    std::string name;
+    const int fd = MakeBeside(SplitPath(besideThis), &name);
+    if (fd < 0)
+        return fd;
+    temporary = name;
+    mark.Set(name);
+    return fd;
 }
 
 void AtomicFile::Write(std::string_view bytes) {
@@ -124,6 +133,7 @@ Status AtomicFile::Commit(Durability durability) {
         return Status::FromErrno(name, error);
     }
     temporary.clear();
+    mark.Clear();
     if (durability == Durability::Flushed)
         FlushDirectory(SplitPath(target).directory);
     return Status::Ok();
@@ -134,6 +144,7 @@ void AtomicFile::Discard() {
     if (!temporary.empty())
         ::unlink(temporary.c_str());
     temporary.clear();
+    mark.Clear();
 }
 
 Status WriteFileAtomically(const std::string& path, std::string_view content,

@@ -6,6 +6,7 @@
 #include <string_view>
 
 #include "base/status.h"
+#include "base/temporary_mark.h"
 
 namespace ryn {
 
@@ -20,8 +21,9 @@ enum class Durability {
 /// file. A target that exists and is no regular file is refused. An existing target's permissions
 /// are kept.
 ///
-/// Without Commit the destructor removes what was written. A kill leaves a hidden file
-/// ".NAME.XXXXXX" beside the target.
+/// Without Commit the destructor removes what was written, and so does a signal once
+/// RemoveTemporariesOnSignals was called. A kill leaves a hidden file ".NAME.XXXXXX" beside the
+/// target.
 class AtomicFile {
   public:
     AtomicFile() = default;
@@ -44,10 +46,13 @@ class AtomicFile {
         void operator()(std::FILE* file) const { std::fclose(file); }
     };
 
+    /// The descriptor, or -1 with errno.
+    int MakeTemporary(const std::string& besideThis);
     void Discard();
 
     std::string target;    // after following links
     std::string temporary; // beside it
+    TemporaryMark mark;    // of the temporary file
     std::unique_ptr<std::FILE, CloseStream> stream;
     int writeError = 0;
 };

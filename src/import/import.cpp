@@ -1,6 +1,8 @@
 #include "import/import.h"
 
 #include <array>
+#include <filesystem>
+#include <system_error>
 
 #include "base/path_parts.h"
 #include "import/dif_table.h"
@@ -11,6 +13,7 @@
 #include "import/read_rows.h"
 #include "import/sample_order.h"
 #include "import/table_text.h"
+#include "import/watched_source.h"
 #include "import/write_series.h"
 
 namespace ryn {
@@ -119,7 +122,7 @@ Status ImportTable(TextSource& source, const ImportOptions& options,
 }
 
 Status ImportFile(const std::string& input, const std::string& output, const ImportOptions& options,
-                  ImportReport* report) {
+                  ImportReport* report, const ImportCallbacks& callbacks) {
     *report = {};
     const std::string title = SplitPath(input).name;
     std::unique_ptr<TextSource> source;
@@ -140,8 +143,14 @@ Status ImportFile(const std::string& input, const std::string& output, const Imp
         if (status)
             status = Finish(input, settings, &samples, report);
     } else {
-        status = ImportTable(*source, options, title, &samples, report);
+        std::error_code unknownSize;
+        const auto size = std::filesystem::file_size(input, unknownSize);
+        WatchedSource watched(*source, unknownSize ? 0 : static_cast<long long>(size),
+                              callbacks.progress);
+        status = ImportTable(watched, options, title, &samples, report);
     }
+    if (status && callbacks.editItems)
+        status = callbacks.editItems(report->items);
     return status ? WriteSeries(output, title, samples, report) : status;
 }
 

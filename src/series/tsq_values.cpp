@@ -58,43 +58,6 @@ double Floor(double value) {
     return whole > value ? whole - 1.0 : whole;
 }
 
-struct Axis {
-    AxisKind kind = AxisKind::EquidistantRelative;
-    std::string date = "1900-01-01"; // where a relative axis counts from
-    std::string time = "00:00:00";
-    int unit = 0;
-    double start = 0.0;
-    double step = 0.0; // of an equidistant axis
-    int count = 0;
-
-    bool IsEquidistant() const {
-        return kind == AxisKind::EquidistantRelative || kind == AxisKind::EquidistantCalendar;
-    }
-};
-
-bool ReadAxis(const TsqHeader* header, Axis* axis) {
-    switch (tsqGetTimeAxisType(header)) {
-    case kTsqEqTimeAxis:
-        axis->kind = AxisKind::EquidistantRelative;
-        return tsqGetEqTimeAxis(header, &axis->unit, nullptr, &axis->start, &axis->step,
-                                &axis->count, nullptr) == 0;
-    case kTsqNeqTimeAxis:
-        axis->kind = AxisKind::NonEquidistantRelative;
-        return tsqGetNeqTimeAxis(header, &axis->unit, nullptr, &axis->start, nullptr, &axis->count,
-                                 nullptr) == 0;
-    case kTsqEqCalendarAxis:
-        axis->kind = AxisKind::EquidistantCalendar;
-        return tsqGetEqCalendarAxis(header, &axis->date, &axis->time, &axis->unit, nullptr,
-                                    &axis->start, &axis->step, &axis->count, nullptr) == 0;
-    case kTsqNeqCalendarAxis:
-        axis->kind = AxisKind::NonEquidistantCalendar;
-        return tsqGetNeqCalendarAxis(header, &axis->date, &axis->time, &axis->unit, nullptr,
-                                     &axis->start, nullptr, &axis->count, nullptr) == 0;
-    default:
-        return false;
-    }
-}
-
 /// Days from the start date to a step of an equidistant axis, whose stored time is not looked at.
 COleDateTimeSpan EquidistantSpan(int index, double stepSeconds) {
     const double seconds = index * stepSeconds + kSecondsGrace;
@@ -125,7 +88,7 @@ Status TimeOutOfCalendar(const std::string& path) {
 struct CTsqValues::OpenItem {
     TsqHeaderHandle header;
     TsqFileHandle file;
-    Axis axis;
+    TsqAxis axis;
     double startCount = 0.0; // the start date's linear count
     double toSecondsFactor = 1.0;
     double toSecondsOffset = 0.0;
@@ -166,7 +129,8 @@ struct CTsqValues::OpenItem {
 };
 
 Status CTsqValues::OpenItem::UnderstandAxis(const std::string& path) {
-    if (!ReadAxis(header.get(), &axis))
+    axis = tsqGetTimeAxis(header.get());
+    if (axis.type == 0)
         return Status::InputFault(path + ": the time axis cannot be read");
     double hours = 0.0;
     if (qtyConvertUnit(axis.unit, axis.start, kUnitHour, &hours) != 0 ||
@@ -231,7 +195,7 @@ Status CTsqValues::Open(const std::string& path, int itemIndex, OpenItem* open) 
 }
 
 void CTsqValues::TakeOver(const OpenItem& open) {
-    axisKind = open.axis.kind;
+    axisKind = AxisKindOf(open.axis.type);
     count = open.axis.count;
     itemType = open.itemType;
     itemUnit = open.itemUnit;
@@ -294,6 +258,7 @@ bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) try {
         read.push_back({date, static_cast<double>(value), 0});
     };
     const bool whole = open.Walk([&](int step, const TsqBlock& block) {
+        ports->progress->ShowProgress(step, open.axis.count);
         if (open.axis.IsEquidistant()) {
             for (int i = 0; i < block.count; ++i)
                 append(open.DateByStep(step + i), block.values[i]);
@@ -303,6 +268,7 @@ bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) try {
         }
         return datesValid;
     });
+    ports->progress->ShowProgress(open.axis.count, open.axis.count);
     if (!whole) {
         readError = datesValid ? tsqTakeError() : TimeOutOfCalendar(path);
         return false;

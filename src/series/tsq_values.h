@@ -20,6 +20,11 @@ enum class AxisKind : int {
     NonEquidistantCalendar = 3,
 };
 
+/// The kind of a file's axis, which has one.
+constexpr AxisKind AxisKindOf(int tsqAxisType) {
+    return static_cast<AxisKind>(tsqAxisType - 1);
+}
+
 /// The index, from 0, of an item number, from 1; -1, which no file has, for a number below 1.
 constexpr int ItemIndex(int itemNumber) {
     return itemNumber < 1 ? -1 : itemNumber - 1;
@@ -42,7 +47,7 @@ struct ExtractionReport {
 /// another program with values marked as missing is refused.
 class CTsqValues {
   public:
-    /// Ways to the outside for what an extraction shows.
+    /// Ways to the outside for what an extraction shows, and for the progress of ReadSeries.
     void UsePorts(const Ports& outside) { ports = &outside; }
 
     /// One pass over an item (index from 0) that keeps count, first, last, smallest and largest

@@ -105,6 +105,15 @@ int tsqGetTimeAxisType(const TsqHeader* header) {
     return header != nullptr ? header->axis.type : 0;
 }
 
+TsqAxis tsqGetTimeAxis(const TsqHeader* header) {
+    TsqAxis axis = header != nullptr ? header->axis : TsqAxis();
+    if (!axis.IsCalendar()) {
+        axis.date = "1900-01-01";
+        axis.time = "00:00:00";
+    }
+    return axis;
+}
+
 int tsqGetEqTimeAxis(const TsqHeader* header, int* unit, std::string* unitText, double* start,
                      double* step, int* count, int* index) {
     if (!HasAxis(header, kTsqEqTimeAxis))

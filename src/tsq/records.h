@@ -10,21 +10,6 @@
 
 namespace ryn {
 
-struct TsqAxis {
-    int type = 0; ///< TsqAxisType; 0 before one is set
-    int unit = kUnitSecond;
-    std::string date; ///< of a calendar axis, "YYYY-MM-DD"
-    std::string time; ///< "HH:MM:SS"
-    double start = 0.0;
-    double step = 0.0; ///< of an equidistant axis
-    double span = 0.0; ///< time of the last step
-    int count = 0;
-    int index = 0;
-
-    bool IsEquidistant() const { return type == kTsqEqTimeAxis || type == kTsqEqCalendarAxis; }
-    bool IsCalendar() const { return type == kTsqEqCalendarAxis || type == kTsqNeqCalendarAxis; }
-};
-
 /// Two equidistant spatial axes; no values where an item has none.
 struct TsqPlane {
     int unit = kUnitUndefined;

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "base/status.h"
+#include "units/units.h"
 
 /// The store of one-dimensional data files (.tsq0, .tq0): a time axis and one or more items with a
 /// value for each time step. docs/formats/tsq.md describes the file, which is netCDF with CF
@@ -42,6 +43,22 @@ enum TsqAxisType : int {
     kTsqNeqCalendarAxis = 4, ///< non-equidistant calendar
 };
 
+/// A time axis of any type.
+struct TsqAxis {
+    int type = 0; ///< TsqAxisType; 0 before one is set
+    int unit = kUnitSecond;
+    std::string date; ///< of a calendar axis, "YYYY-MM-DD"
+    std::string time; ///< "HH:MM:SS"
+    double start = 0.0;
+    double step = 0.0; ///< of an equidistant axis
+    double span = 0.0; ///< time of the last step
+    int count = 0;     ///< time steps
+    int index = 0;     ///< the number given when the axis was set
+
+    bool IsEquidistant() const { return type == kTsqEqTimeAxis || type == kTsqEqCalendarAxis; }
+    bool IsCalendar() const { return type == kTsqEqCalendarAxis || type == kTsqNeqCalendarAxis; }
+};
+
 // Reading.
 
 /// Opens a file of ours or any netCDF file with items along one time axis. On failure both handles
@@ -58,6 +75,9 @@ int tsqFileReadUnordered(const std::string& path, TsqHeaderHandle* header, TsqFi
 bool tsqFileExists(const std::string& path);
 /// 0 for a header without an axis.
 int tsqGetTimeAxisType(const TsqHeader* header);
+/// The axis of a header, whatever its type; a relative one has 1900-01-01 00:00:00 for its date.
+/// Type 0 for a header without an axis.
+TsqAxis tsqGetTimeAxis(const TsqHeader* header);
 // Axis operations: each answers for its own axis type and fails, outputs unchanged, for another.
 // Null outputs are passed over. `start` and `step` are in the axis's unit, `span` is the time of
 // the last step, `count` the number of time steps, `index` the number given when the axis was set.

@@ -78,6 +78,10 @@ bool IsTableUnit(int code) {
     return FindUnitRow(code) != nullptr;
 }
 
+bool IsKnownUnit(int code) {
+    return IsTableUnit(code) || UnitRegistry::Instance().LibraryKnows(code);
+}
+
 Status UnitDatabaseStatus() {
     return UnitRegistry::Instance().LibraryLoaded();
 }

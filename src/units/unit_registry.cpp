@@ -68,6 +68,12 @@ int UnitRegistry::CodeOf(std::string_view text) {
     return code;
 }
 
+bool UnitRegistry::LibraryKnows(int code) {
+    const std::lock_guard lock(mutex);
+    const std::string_view text = TextUnlocked(code);
+    return !text.empty() && Library().Knows(text);
+}
+
 const UnitConverter* UnitRegistry::ConverterFor(int from, int to) {
     const auto [place, isNew] = converters.try_emplace({from, to});
     if (isNew)

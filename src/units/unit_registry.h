@@ -21,6 +21,8 @@ class UnitRegistry {
 
     std::string TextOf(int code);
     int CodeOf(std::string_view text);
+    /// Whether UDUNITS understands the unit's text.
+    bool LibraryKnows(int code);
     /// Converts by UDUNITS; nothing when there is no conversion.
     std::optional<double> Convert(int from, int to, double value);
     Status LibraryLoaded();

@@ -32,6 +32,9 @@ std::string UnitText(int code);
 int UnitOfText(std::string_view text);
 /// True for a code of the table, which means the same in every process.
 bool IsTableUnit(int code);
+/// True for a unit of the table and for any text that UDUNITS understands; a code that only keeps
+/// a text is none, and converts into nothing.
+bool IsKnownUnit(int code);
 /// Ok when UDUNITS found its database of units (UDUNITS2_XML_PATH in the environment, else the
 /// installed file); else why not. Without it only time units and equal codes convert, and only the
 /// writings that the table lists are recognised.

@@ -2,6 +2,7 @@
 
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "ports/ports.h"
@@ -26,6 +27,7 @@ class RecordingPorts final : public MessagePort,
     std::vector<std::vector<int>> missingYears;
     std::vector<std::string> questions;
     std::vector<std::string> recentFiles;
+    std::vector<std::pair<long long, long long>> progress;
     std::vector<std::string> viewedFiles;
     FontRecord messageFont;
     int focusReleases = 0;
@@ -47,7 +49,9 @@ class RecordingPorts final : public MessagePort,
     void ReleaseFocus() override { ++focusReleases; }
     void AddRecentFile(const std::string& path) override { recentFiles.push_back(path); }
     std::string ApplicationName() override { return "Test"; }
-    void ShowProgress(long long /*done*/, long long /*total*/) override {}
+    void ShowProgress(long long done, long long total) override {
+        progress.emplace_back(done, total);
+    }
     void BeginBusy() override { ++busy; }
     void RestoreBusy() override { ++busyRestores; }
     void EndBusy() override { --busy; }

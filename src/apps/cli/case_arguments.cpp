@@ -7,6 +7,7 @@
 #include "apps/cli/nearest_names.h"
 #include "apps/cli/setting_value.h"
 #include "apps/cli/settings.h"
+#include "base/number_text.h"
 #include "params/combination_name.h"
 #include "strings/catalogue.h"
 
@@ -70,6 +71,18 @@ Status ReplacePeriods(CAnalysisKvf& analysis, const std::optional<std::string>& 
     return Status::Ok();
 }
 
+/// What no kind of series makes right is refused; `check` tells of the rest, which depends on
+/// settings that may still come. Periods that the file had are not looked at.
+Status TestPeriods(const CAnalysisKvf& analysis, const CaseArguments& arguments) {
+    if (!arguments.periods && !AssignsTo(arguments, "Analysis.EvaluatedReturnPeriods.Item"))
+        return Status::Ok();
+    for (const double period : analysis.EvaluatedReturnPeriods)
+        if (!(period > 0.0))
+            return Status::InputFault(
+                FormatText(kTextCliPeriodTooSmall, ShortestText(period), ShortestText(0.0)));
+    return Status::Ok();
+}
+
 std::string KindName(int selectionMethod) {
     return std::string(
         Text(selectionMethod == 0 ? kTextCliAnnualMaxima : kTextCliPartialDurations));
@@ -86,6 +99,8 @@ Status ApplyArguments(CGlobalKvf& root, const CaseArguments& arguments,
         status = ReplaceCombinations(root, arguments.fits);
     if (status)
         status = ReplacePeriods(root.Analysis(), arguments.periods);
+    if (status)
+        status = TestPeriods(root.Analysis(), arguments);
     if (status)
         status = Assign(root, arguments, true, callerDirectory);
     return status;

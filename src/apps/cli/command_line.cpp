@@ -8,6 +8,7 @@
 
 #include "apps/cli/command_options.h"
 #include "apps/cli/nearest_names.h"
+#include "apps/cli/parse_error_text.h"
 #include "strings/catalogue.h"
 
 namespace ryn::cli {
@@ -64,11 +65,14 @@ int CommandLine::ShowParseError(const CLI::ParseError& error,
         return kExitDone;
     }
     const std::vector<CLI::App*> chosen = app.get_subcommands();
+    const CLI::App& command = chosen.empty() ? app : *chosen.front();
     if (chosen.empty() && (arguments.empty() || arguments.front().rfind('-', 0) != 0))
         ShowError(console, UnknownCommand(arguments));
+    else if (chosen.empty() && app.remaining().empty()) // options of the program alone
+        ShowError(console, UnknownCommand({}));
     else
-        ShowError(console, FormatText(kTextCliBadCommandLine, std::string(error.what()),
-                                      chosen.empty() ? "" : chosen.front()->get_name() + " "));
+        ShowError(console, FormatText(kTextCliBadCommandLine, ParseErrorText(error, command),
+                                      chosen.empty() ? "" : command.get_name() + " "));
     return kExitInput;
 }
 

@@ -6,7 +6,9 @@
 
 namespace ryn::cli {
 
-ProgressLine::ProgressLine(Console& shownOn) : console(shownOn) {}
+ProgressLine::ProgressLine(Console& shownOn, std::chrono::milliseconds patience)
+    : console(shownOn),
+      shownFrom(std::chrono::steady_clock::now() + patience) {}
 
 ProgressLine::~ProgressLine() {
     Clear();
@@ -15,10 +17,11 @@ ProgressLine::~ProgressLine() {
 void ProgressLine::ShowProgress(long long done, long long total) {
     if (!console.errIsTerminal || total <= 0)
         return;
+    if (done >= total)
+        return Clear();
     const auto percent =
         static_cast<int>(100.0 * static_cast<double>(done) / static_cast<double>(total));
-    if (percent == shownPercent ||
-        std::chrono::steady_clock::now() - start < std::chrono::seconds(1))
+    if (percent == shownPercent || std::chrono::steady_clock::now() < shownFrom)
         return;
     shownPercent = percent;
     console.err << '\r' << std::to_string(percent) << " %" << std::flush;

@@ -9,11 +9,13 @@
 
 namespace ryn::cli {
 
-/// A terminal's line that shows how far long work has come: nothing in the first second, nothing
-/// where standard error is no terminal, and the line is gone afterwards.
+/// A terminal's line that shows how far long work has come: nothing in its first half second,
+/// nothing where standard error is no terminal, and the line is gone when all is done.
 class ProgressLine final : public ProgressPort {
   public:
-    explicit ProgressLine(Console& shownOn);
+    static constexpr std::chrono::milliseconds kPatience{500};
+
+    explicit ProgressLine(Console& shownOn, std::chrono::milliseconds patience = kPatience);
     ~ProgressLine() override;
     ProgressLine(const ProgressLine&) = delete;
     ProgressLine& operator=(const ProgressLine&) = delete;
@@ -24,7 +26,7 @@ class ProgressLine final : public ProgressPort {
 
   private:
     Console& console;
-    std::chrono::steady_clock::time_point start = std::chrono::steady_clock::now();
+    std::chrono::steady_clock::time_point shownFrom;
     int shownPercent = -1;
 };
 

@@ -10,17 +10,6 @@ namespace ryn::cli {
 
 namespace {
 
-/// The time axis as the store gives it.
-struct StoredAxis {
-    std::string date = "1900-01-01";
-    std::string time = "00:00:00";
-    int unit = 0;
-};
-
-bool IsEquidistant(AxisKind kind) {
-    return kind == AxisKind::EquidistantRelative || kind == AxisKind::EquidistantCalendar;
-}
-
 /// The library's own reason for a failure of which the caller knows no other.
 Status StoreError(const std::string& path) {
     Status error = tsqTakeError();
@@ -45,34 +34,10 @@ Status DataFile::Open(const std::string& path) {
 }
 
 Status DataFile::ReadAxis() {
-    StoredAxis axis;
-    const TsqHeader* const h = header.get();
-    int failed = 1;
-    switch (tsqGetTimeAxisType(h)) {
-    case kTsqEqTimeAxis:
-        axisKind = AxisKind::EquidistantRelative;
-        failed = tsqGetEqTimeAxis(h, &axis.unit, nullptr, &start, &step, &stepCount, nullptr);
-        break;
-    case kTsqNeqTimeAxis:
-        axisKind = AxisKind::NonEquidistantRelative;
-        failed = tsqGetNeqTimeAxis(h, &axis.unit, nullptr, &start, nullptr, &stepCount, nullptr);
-        break;
-    case kTsqEqCalendarAxis:
-        axisKind = AxisKind::EquidistantCalendar;
-        failed = tsqGetEqCalendarAxis(h, &axis.date, &axis.time, &axis.unit, nullptr, &start, &step,
-                                      &stepCount, nullptr);
-        break;
-    case kTsqNeqCalendarAxis:
-        axisKind = AxisKind::NonEquidistantCalendar;
-        failed = tsqGetNeqCalendarAxis(h, &axis.date, &axis.time, &axis.unit, nullptr, &start,
-                                       nullptr, &stepCount, nullptr);
-        break;
-    default:
-        break;
-    }
+    axis = tsqGetTimeAxis(header.get());
     double offset = 0.0;
     const std::optional<COleDateTime> zero = ParseDate(axis.date + "T" + axis.time, 0);
-    if (failed != 0 || !zero || !UnitConversion(axis.unit, kUnitSecond, &unitSeconds, &offset))
+    if (axis.type == 0 || !zero || !UnitConversion(axis.unit, kUnitSecond, &unitSeconds, &offset))
         return Status::InputFault(FormatText(kTextCliBadTimeAxis, fileName));
     origin = *zero;
     return Status::Ok();
@@ -98,12 +63,14 @@ std::vector<int> DataFile::PlainItems() const {
     return numbers;
 }
 
-COleDateTime DataFile::DateOf(int index, double time) const {
+double DataFile::SecondsOf(int index, double time) const {
     // The steps of an equidistant axis are computed, as the analysis does, and not looked up.
-    const double inUnit = start + (IsEquidistant(axisKind) ? index * step : time);
+    return (axis.start + (axis.IsEquidistant() ? index * axis.step : time)) * unitSeconds;
+}
+
+COleDateTime DataFile::DateOf(double seconds) const {
     // Stored times are rounded to the millisecond; half of one keeps a whole second whole.
-    const double seconds = std::floor(inUnit * unitSeconds + 5e-4);
-    return origin + COleDateTimeSpan(seconds / 86400.0);
+    return origin + COleDateTimeSpan(std::floor(seconds + 5e-4) / 86400.0);
 }
 
 Status DataFile::ReadStep(const std::vector<int>& itemNumbers, double* time, float* values) {
@@ -120,19 +87,20 @@ Status DataFile::ReadStep(const std::vector<int>& itemNumbers, double* time, flo
 
 Status DataFile::Walk(const std::vector<int>& itemNumbers,
                       const std::function<bool(const DataStep&)>& use) {
-    if (stepCount == 0)
+    if (axis.count == 0)
         return Status::Ok();
     if (tsqFindBlockDynamic(header.get(), file.get()) != 0)
         return StoreError(fileName);
     std::vector<float> values(itemNumbers.size());
-    for (int index = 0; index < stepCount; ++index) {
+    for (int index = 0; index < axis.count; ++index) {
         double time = 0.0;
         if (Status read = ReadStep(itemNumbers, &time, values.data()); !read)
             return read;
-        const COleDateTime date = DateOf(index, time);
+        const double seconds = SecondsOf(index, time);
+        const COleDateTime date = DateOf(seconds);
         if (!date.IsValid())
             return Status::InputFault(FormatText(kTextCliTimeOutOfCalendar, fileName, index + 1));
-        if (!use({index, date, values}))
+        if (!use({index, date, seconds, values}))
             break;
     }
     return Status::Ok();

@@ -24,6 +24,7 @@ struct DataItem {
 struct DataStep {
     int index = 0; ///< from 0
     COleDateTime date;
+    double seconds = 0.0;          ///< since what the axis counts from, with their fraction
     std::span<const float> values; ///< in the order asked for; NaN where the file marks one missing
 };
 
@@ -39,8 +40,8 @@ class DataFile {
     Status Open(const std::string& path);
 
     const std::string& Title() const { return title; }
-    AxisKind Axis() const { return axisKind; }
-    int StepCount() const { return stepCount; }
+    AxisKind Axis() const { return AxisKindOf(axis.type); }
+    int StepCount() const { return axis.count; }
     const std::vector<DataItem>& Items() const { return items; }
     /// Numbers of the items that are plain series.
     std::vector<int> PlainItems() const;
@@ -54,17 +55,15 @@ class DataFile {
     Status ReadAxis();
     void ReadItems();
     Status ReadStep(const std::vector<int>& itemNumbers, double* time, float* values);
-    COleDateTime DateOf(int index, double time) const;
+    double SecondsOf(int index, double time) const;
+    COleDateTime DateOf(double seconds) const;
 
     std::string fileName;
     TsqHeaderHandle header;
     TsqFileHandle file;
     std::string title;
-    AxisKind axisKind = AxisKind::EquidistantRelative;
-    int stepCount = 0;
+    TsqAxis axis;
     COleDateTime origin; ///< what the axis's times count from
-    double start = 0.0;  ///< of the axis, in its unit
-    double step = 0.0;   ///< of an equidistant axis, in its unit
     double unitSeconds = 1.0;
     std::vector<DataItem> items;
 };

@@ -7,6 +7,7 @@
 #include "apps/cli/case_arguments.h"
 #include "apps/cli/command_options.h"
 #include "apps/cli/fit_report.h"
+#include "apps/cli/fit_texts.h"
 #include "apps/cli/input_file.h"
 #include "apps/cli/number_column.h"
 #include "apps/cli/setting_value.h"
@@ -15,6 +16,7 @@
 #include "series/tsq_values.h"
 #include "stats/return_period.h"
 #include "strings/catalogue.h"
+#include "units/units.h"
 
 namespace ryn::cli {
 
@@ -30,6 +32,7 @@ struct FitTask {
     stats::SeriesFrame frame;
     std::vector<double> periods;
     std::vector<double> values;
+    std::string unit; ///< of the values, where a data file tells it
 };
 
 stats::Combination CombinationOf(const DieCombination& settings) {
@@ -67,12 +70,13 @@ Status PeriodsOf(const FitOptions& options, const stats::SeriesFrame& frame,
     return Status::Ok();
 }
 
-Status ReadSeriesValues(const FitOptions& options, std::vector<double>* values) {
+Status ReadSeriesValues(const FitOptions& options, FitTask* task) {
     CTsqValues series;
     if (!series.ReadSeries(options.values, options.item.value_or(1) - 1))
         return series.ReadError();
     for (const STSItem& sample : series.samples)
-        values->push_back(sample.value);
+        task->values.push_back(sample.value);
+    task->unit = UnitText(series.itemUnit);
     return Status::Ok();
 }
 
@@ -93,14 +97,14 @@ Status ReadTextValues(const FitOptions& options, Console& console, std::vector<d
     return Status::Ok();
 }
 
-Status ReadValues(const FitOptions& options, Console& console, std::vector<double>* values) {
+Status ReadValues(const FitOptions& options, Console& console, FitTask* task) {
     if (options.values == "-")
-        return ReadTextValues(options, console, values);
+        return ReadTextValues(options, console, &task->values);
     if (Status readable = TestReadable(options.values); !readable)
         return readable;
     return KindOfFile(options.values) == FileKind::DataFile
-               ? ReadSeriesValues(options, values)
-               : ReadTextValues(options, console, values);
+               ? ReadSeriesValues(options, task)
+               : ReadTextValues(options, console, &task->values);
 }
 
 Status MakeTask(const FitOptions& options, Console& console, FitTask* task) {
@@ -114,7 +118,7 @@ Status MakeTask(const FitOptions& options, Console& console, FitTask* task) {
     if (status)
         status = PeriodsOf(options, task->frame, &task->periods);
     if (status)
-        status = ReadValues(options, console, &task->values);
+        status = ReadValues(options, console, task);
     return status;
 }
 
@@ -122,11 +126,11 @@ FitReport FitTaskOf(const FitTask& task) {
     FitReport report;
     report.name = task.name;
     report.count = task.values.size();
+    report.unit = task.unit;
     const stats::FitInput input{task.values, task.frame};
     const stats::FitResult result = stats::Fit(task.combination, input);
     if (!result) {
-        const std::string code = stats::FailureCode(result.Failure());
-        report.failure = (code.empty() ? "" : code + ": ") + stats::FailureText(result.Failure());
+        report.failure = FitFailureText(result.Failure(), task.values);
         return report;
     }
     report.model = *result;
@@ -154,7 +158,7 @@ int RunFit(const FitOptions& options, Console& console) {
         return kExitAnalysis;
     }
     for (const stats::FitWarning& warning : report.model->warnings)
-        ShowWarning(console, report.name + ": " + stats::WarningText(warning));
+        ShowWarning(console, report.name + ": " + FitWarningText(warning));
     return kExitDone;
 }
 

@@ -4,6 +4,7 @@
 #include <cmath>
 #include <ostream>
 
+#include "apps/cli/plain_text.h"
 #include "apps/cli/text_table.h"
 #include "base/number_text.h"
 #include "strings/catalogue.h"
@@ -56,21 +57,22 @@ int ColumnDecimals(const std::vector<double>& numbers, int digits) {
     return decimals;
 }
 
-void PrintQuantiles(std::ostream& out, const std::vector<FitQuantile>& quantiles) {
+void PrintQuantiles(std::ostream& out, const FitReport& report) {
     constexpr int kProbabilityDigits = 3;
     constexpr int kEstimateDigits = 5;
     std::vector<double> probabilities;
     std::vector<double> estimates;
-    for (const FitQuantile& quantile : quantiles) {
+    for (const FitQuantile& quantile : report.quantiles) {
         probabilities.push_back(quantile.exceedance);
         estimates.push_back(quantile.estimate);
     }
     const int probabilityDecimals = ColumnDecimals(probabilities, kProbabilityDigits);
     const int estimateDecimals = ColumnDecimals(estimates, kEstimateDigits);
     TextTable table({Alignment::Right, Alignment::Right, Alignment::Right});
-    table.AddRow(
-        {TextOf(kTextCliReturnPeriod), TextOf(kTextCliExceedance), TextOf(kTextCliEstimate)});
-    for (const FitQuantile& quantile : quantiles)
+    const std::string unit = report.unit.empty() ? "" : " [" + PlainLine(report.unit) + ']';
+    table.AddRow({TextOf(kTextCliReturnPeriod), TextOf(kTextCliExceedance),
+                  TextOf(kTextCliEstimate) + unit});
+    for (const FitQuantile& quantile : report.quantiles)
         table.AddRow({ShortestText(quantile.period),
                       FixedText(quantile.exceedance, probabilityDecimals),
                       FixedText(quantile.estimate, estimateDecimals)});
@@ -93,6 +95,7 @@ Json JsonOfFit(const FitReport& report) {
         quantiles.push_back(JsonOfQuantile(quantile));
     return {{"name", report.name},
             {"n", report.count},
+            {"unit", report.unit},
             {"failed", report.failure.empty() ? Json(nullptr) : Json(report.failure)},
             {"parameters", JsonOfParameters(report)},
             {"logLikelihood", report.model ? JsonOf(report.model->logLikelihood) : Json(nullptr)},
@@ -104,7 +107,7 @@ void PrintFit(std::ostream& out, const FitReport& report) {
     out << FormatText(kTextCliFitHeading, report.name, static_cast<int>(report.count)) << "\n\n";
     PrintParameters(out, *report.model);
     out << '\n';
-    PrintQuantiles(out, report.quantiles);
+    PrintQuantiles(out, report);
 }
 
 } // namespace ryn::cli

@@ -21,14 +21,15 @@ struct FitQuantile {
 struct FitReport {
     std::string name;
     std::size_t count = 0;
+    std::string unit;    ///< of the values; empty where none is known
     std::string failure; ///< empty: fitted
     std::optional<stats::FittedModel> model;
     std::vector<FitQuantile> quantiles;
 };
 
-/// Members: name, n, failed (null or the reason), parameters (symbol, estimate), logLikelihood,
-/// quantiles (period, probability of exceedance, estimate, average, standardDeviation; the last two
-/// are null, since no uncertainty was estimated), goodness.
+/// Members: name, n, unit, failed (null or the reason), parameters (symbol, estimate),
+/// logLikelihood, quantiles (period, probability of exceedance, estimate, average,
+/// standardDeviation; the last two are null, since no uncertainty was estimated), goodness.
 Json JsonOfFit(const FitReport& report);
 void PrintFit(std::ostream& out, const FitReport& report);
 

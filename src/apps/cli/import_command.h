@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 #include "apps/cli/command_line.h"
 #include "apps/cli/console.h"
@@ -13,7 +14,9 @@ namespace ryn::cli {
 struct ImportCommandOptions {
     std::string input;
     std::string output;
-    ImportOptions table; ///< what the user says about the table; the rest is found out
+    ImportOptions table;            ///< what the user says about the table; the rest is found out
+    std::vector<std::string> units; ///< one for all items, or one for each of --item
+    std::vector<std::string> names; ///< one for each item
     OutputForm form = OutputForm::Text;
     Consent consent = Consent::NotGiven;
 };

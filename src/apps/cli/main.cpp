@@ -9,6 +9,7 @@
 
 #include "apps/cli/descriptor_output.h"
 #include "apps/cli/run_ryn.h"
+#include "base/temporary_mark.h"
 #include "strings/catalogue.h"
 
 namespace {
@@ -42,6 +43,7 @@ int main(int argumentCount, char** arguments) {
     std::signal(SIGPIPE, SIG_IGN);
     // Nor a limit on the size of files: the write fails, and what was written is taken away.
     std::signal(SIGXFSZ, SIG_IGN);
+    ryn::RemoveTemporariesOnSignals();
     ryn::cli::DescriptorOutput buffer(STDOUT_FILENO);
     std::ostream out(&buffer);
     ryn::cli::Console console{out, std::cerr, std::cin, ::isatty(STDERR_FILENO) != 0};

@@ -1,6 +1,8 @@
 #include "apps/cli/series_info.h"
 
+#include <algorithm>
 #include <cmath>
+#include <limits>
 #include <ostream>
 
 #include "apps/cli/date_text.h"
@@ -47,6 +49,34 @@ void ExtendTimes(SeriesInfo& info, const COleDateTime& date) {
     info.last = date;
 }
 
+/// The lengths of the time steps, which tell a regular axis.
+class StepLengths {
+  public:
+    void Add(double time) {
+        if (times++ == 0) {
+            first = time;
+        } else {
+            shortest = std::min(shortest, time - last);
+            longest = std::max(longest, time - last);
+        }
+        last = time;
+    }
+    /// To the millisecond; nothing when they differ, or there are fewer than `least`.
+    std::optional<double> Common(int least) const {
+        const double tolerance = std::min(0.5, 0.1 * shortest);
+        if (times <= least || !(shortest > 0.0) || longest - shortest > tolerance)
+            return std::nullopt;
+        return std::round((last - first) / (times - 1) * 1e3) / 1e3;
+    }
+
+  private:
+    int times = 0;
+    double first = 0.0;
+    double last = 0.0;
+    double shortest = std::numeric_limits<double>::infinity();
+    double longest = 0.0;
+};
+
 std::string_view AxisName(AxisKind kind) {
     switch (kind) {
     case AxisKind::EquidistantRelative:
@@ -67,6 +97,12 @@ int AxisTextId(AxisKind kind) {
 
 bool IsEquidistant(AxisKind kind) {
     return kind == AxisKind::EquidistantRelative || kind == AxisKind::EquidistantCalendar;
+}
+
+AxisKind Equidistant(AxisKind kind) {
+    return kind == AxisKind::NonEquidistantRelative   ? AxisKind::EquidistantRelative
+           : kind == AxisKind::NonEquidistantCalendar ? AxisKind::EquidistantCalendar
+                                                      : kind;
 }
 
 Json JsonOfSample(const DatedValue& sample) {
@@ -105,6 +141,11 @@ std::string GapText(const SeriesInfo& info) {
            " - " + DateForPeople(info.gapTo) + ")";
 }
 
+std::string StepText(double seconds) {
+    return seconds == std::round(seconds) ? LengthForPeople(COleDateTimeSpan(seconds / 86400.0))
+                                          : ShortestText(seconds) + " s";
+}
+
 void PrintHead(std::ostream& out, const SeriesInfo& info) {
     TextTable head({Alignment::Left, Alignment::Left});
     if (!info.title.empty())
@@ -115,8 +156,8 @@ void PrintHead(std::ostream& out, const SeriesInfo& info) {
         head.AddRow({TextOf(kTextCliFirst), DateForPeople(info.first)});
         head.AddRow({TextOf(kTextCliLast), DateForPeople(info.last)});
     }
-    if (info.gapFrom.IsValid() && IsEquidistant(info.axis))
-        head.AddRow({TextOf(kTextCliTimeStep), LengthForPeople(info.gapTo - info.gapFrom)});
+    if (info.step)
+        head.AddRow({TextOf(kTextCliTimeStep), StepText(*info.step)});
     else if (info.gapFrom.IsValid())
         head.AddRow({TextOf(kTextCliLongestGap), GapText(info)});
     head.Print(out);
@@ -163,8 +204,10 @@ Status ReadSeriesInfo(const std::string& path, ProgressPort& progress, SeriesInf
         read.items.push_back(std::move(extent));
     }
     const std::vector<int> numbers = file.PlainItems();
+    StepLengths lengths;
     Status walked = file.Walk(numbers, [&](const DataStep& step) {
         ExtendTimes(read, step.date);
+        lengths.Add(step.seconds);
         for (std::size_t i = 0; i < numbers.size(); ++i)
             Extend(read.items[static_cast<std::size_t>(numbers[i] - 1)], step.date, step.values[i]);
         constexpr int kStepsBetween = 1 << 16;
@@ -172,6 +215,9 @@ Status ReadSeriesInfo(const std::string& path, ProgressPort& progress, SeriesInf
             progress.ShowProgress(step.index, read.stepCount);
         return true;
     });
+    read.step = lengths.Common(IsEquidistant(read.axis) ? 1 : 2);
+    if (read.step)
+        read.axis = Equidistant(read.axis);
     if (walked)
         *info = std::move(read);
     return walked;
@@ -181,10 +227,11 @@ Json JsonOfSeries(const SeriesInfo& info) {
     Json items = Json::array();
     for (const ItemExtent& extent : info.items)
         items.push_back(JsonOfItem(extent));
-    return {{"axis", AxisName(info.axis)}, {"count", info.stepCount},
-            {"title", info.title},         {"first", JsonOf(info.first)},
-            {"last", JsonOf(info.last)},   {"longestGap", JsonOfGap(info)},
-            {"items", std::move(items)}};
+    return {
+        {"axis", AxisName(info.axis)},   {"step", info.step ? JsonOf(*info.step) : Json(nullptr)},
+        {"count", info.stepCount},       {"title", info.title},
+        {"first", JsonOf(info.first)},   {"last", JsonOf(info.last)},
+        {"longestGap", JsonOfGap(info)}, {"items", std::move(items)}};
 }
 
 void PrintSeries(std::ostream& out, const SeriesInfo& info, const std::string& name) {

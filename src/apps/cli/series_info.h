@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -30,7 +31,12 @@ struct ItemExtent {
 /// What a data file holds.
 struct SeriesInfo {
     std::string title;
+    /// Equidistant also for an axis that the file stores time by time, as other programs do, when
+    /// it has a step.
     AxisKind axis = AxisKind::EquidistantRelative;
+    /// Seconds from time step to time step, where they are equal to half a second and a tenth of
+    /// themselves. Two time steps alone make no step on an axis stored time by time.
+    std::optional<double> step;
     int stepCount = 0;
     COleDateTime first; ///< time step
     COleDateTime last;

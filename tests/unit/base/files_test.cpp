@@ -1,7 +1,10 @@
+#include <csignal>
 #include <filesystem>
+#include <memory>
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
+#include <vector>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -92,6 +95,57 @@ TEST(AtomicFile, LeavesTheOldOrTheNewFileWhenKilledAtAnyMoment) {
         const std::string content = directory.Read("a.txt");
         ASSERT_TRUE(content == old || content == fresh) << content.size();
     }
+}
+
+/// The signal that ended a child which has one file half written, and another one finished.
+int SignalThatEnded(const TemporaryDirectory& directory, int signal) {
+    const pid_t child = ::fork();
+    if (child == 0) {
+        ::signal(SIGHUP, SIG_IGN);
+        RemoveTemporariesOnSignals();
+        std::filesystem::current_path(directory.Root());
+        AtomicFile done;
+        AtomicFile open;
+        if (!done.Open("done.txt") || !open.Open("open.txt"))
+            ::_exit(1);
+        done.Write("new");
+        open.Write(std::string(100000, 'x'));
+        if (!done.Commit(Durability::Unflushed))
+            ::_exit(1);
+        std::filesystem::current_path("/"); // the names must not hang on where the process is
+        ::raise(signal);
+        std::filesystem::current_path(directory.Root());
+        open.Write("y");
+        ::_exit(open.Commit(Durability::Unflushed) ? 0 : 1);
+    }
+    int state = 0;
+    ::waitpid(child, &state, 0);
+    return WIFSIGNALED(state) ? WTERMSIG(state) : 0;
+}
+
+TEST(AtomicFile, LeavesNoTemporaryFileWhenASignalEndsTheProcess) {
+    for (const int signal : {SIGINT, SIGTERM, SIGKILL}) {
+        const TemporaryDirectory directory;
+        EXPECT_EQ(SignalThatEnded(directory, signal), signal);
+        EXPECT_EQ(directory.Read("done.txt"), "new");
+        // Nothing can be done about a kill, which shows that there was a file to remove.
+        EXPECT_EQ(directory.EntryCount(), signal == SIGKILL ? 2U : 1U);
+    }
+    const TemporaryDirectory directory;
+    EXPECT_EQ(SignalThatEnded(directory, SIGHUP), 0) << "it was ignored before";
+    EXPECT_EQ(directory.EntryCount(), 2U);
+}
+
+TEST(AtomicFile, IsMadeAlsoWhenTooManyAreOpenToBeMarked) {
+    const TemporaryDirectory directory;
+    std::vector<std::unique_ptr<AtomicFile>> open;
+    for (int i = 0; i < 40; ++i) {
+        open.push_back(std::make_unique<AtomicFile>());
+        ASSERT_TRUE(open.back()->Open(directory.Path(std::to_string(i))));
+    }
+    for (const auto& file : open)
+        EXPECT_TRUE(file->Commit(Durability::Unflushed));
+    EXPECT_EQ(directory.EntryCount(), 40U);
 }
 
 TEST(FileAccess, TellsWhatCanBeRead) {

@@ -1,4 +1,5 @@
 #include "command_fixture.h"
+#include "strings/language.h"
 
 namespace ryn::cli {
 namespace {
@@ -36,6 +37,7 @@ TEST_P(BadCommandLines, AreAnsweredInOneLine) {
     ASSERT_EQ(Run({"new", "case.ryn"}), 0);
     const std::string saved = files.Read("case.RYN");
     EXPECT_EQ(Run(GetParam().arguments), GetParam().code);
+    SetLanguage(Language::English);
     EXPECT_TRUE(IsLineLike(err, GetParam().line)) << err;
     EXPECT_EQ(out, "");
     EXPECT_EQ(files.Read("case.RYN"), saved);
@@ -47,17 +49,43 @@ const BadCommandLine kCommands[] = {
     {"NoCommand",
      {},
      1,
-     "ryn: no command is given; there are: import, export, info, new, set, check, extract, run, show, fit "
+     "ryn: no command is given; there are: import, export, info, new, set, check, extract, run, "
+     "show, fit "
      "(ryn --help tells the usage)\n"},
     {"UnknownCommand", {"exprt", "s.tsq0"}, 1, "ryn: unknown command exprt; nearest: export\n"},
+    {"OptionsWithoutCommand", {"--lang", "en"}, 1, "ryn: no command is given; there are: *"},
     {"UnknownOption",
      {"check", "case.ryn", "--jsn"},
      1,
-     "ryn: The following argument was not expected: --jsn (ryn check --help tells the usage)\n"},
+     "ryn: not expected: --jsn; nearest: --json (ryn check --help tells the usage)\n"},
+    {"UnknownOptionBeforeTheCommand",
+     {"--verbose"},
+     1,
+     "ryn: not expected: --verbose (ryn --help tells the usage)\n"},
+    {"TooManyArguments",
+     {"check", "case.ryn", "b", "c"},
+     1,
+     "ryn: not expected: b c (ryn check --help tells the usage)\n"},
     {"MissingArgument",
      {"check"},
      1,
-     "ryn: CASE.ryn is required (ryn check --help tells the usage)\n"},
+     "ryn: CASE.ryn is missing (ryn check --help tells the usage)\n"},
+    {"MissingValue",
+     {"export", "s.tsq0", "--item"},
+     1,
+     "ryn: --item: its value is missing (ryn export --help tells the usage)\n"},
+    {"OptionGivenTwice",
+     {"export", "s.tsq0", "--item", "1", "--item", "1"},
+     1,
+     "ryn: --item: may be given only once (ryn export --help tells the usage)\n"},
+    {"ValueThatIsNone",
+     {"show", "case.ryn", "--page", "x"},
+     1,
+     "ryn: --page: \"x\" is no valid value (ryn show --help tells the usage)\n"},
+    {"InJapanese",
+     {"check", "--lang", "ja"},
+     1,
+     "ryn: CASE.ryn がありません（使い方: ryn check --help）\n"},
     {"UnknownLanguage",
      {"check", "case.ryn", "--lang", "fr"},
      1,
@@ -173,6 +201,18 @@ const BadCommandLine kValues[] = {
      {"set", "case.ryn", "--periods", "2,,10"},
      1,
      "ryn: --periods: \"2,,10\" is no valid value; expected: numbers with commas between them\n"},
+    {"PeriodThatIsNeverRight",
+     {"new", "case.ryn", "--yes", "--periods", "10,0"},
+     1,
+     "ryn: return period 0 must be greater than 0 years\n"},
+    {"PeriodSetBelowZero",
+     {"set", "case.ryn", "Analysis.EvaluatedReturnPeriods.Item=-2.5"},
+     1,
+     "ryn: return period -2.5 must be greater than 0 years\n"},
+    {"PeriodThatIsNotFinite",
+     {"set", "case.ryn", "--periods", "inf"},
+     1,
+     "ryn: --periods: \"inf\" is no valid value; expected: numbers with commas between them\n"},
     {"GoodThenBad",
      {"set", "case.ryn", "DefineEVS.Title=x", "DefineEVS.Threshold=y"},
      1,

@@ -1,4 +1,5 @@
 #include <cerrno>
+#include <chrono>
 #include <csignal>
 #include <fcntl.h>
 #include <ostream>
@@ -6,6 +7,7 @@
 
 #include <gtest/gtest.h>
 
+#include "apps/cli/console_ports.h"
 #include "apps/cli/date_text.h"
 #include "apps/cli/descriptor_output.h"
 #include "apps/cli/nearest_names.h"
@@ -97,6 +99,24 @@ TEST(LengthForPeople, NamesTheUnitsThatCount) {
     EXPECT_EQ(LengthForPeople(COleDateTimeSpan(31.25)), "31 d 6 h");
     EXPECT_EQ(LengthForPeople(COleDateTimeSpan(0, 0, 0, 59)), "59 s");
     EXPECT_EQ(LengthForPeople(COleDateTimeSpan(0.0)), "0 s");
+}
+
+TEST(ProgressLine, IsShownOnATerminalUntilAllIsDone) {
+    std::istringstream in;
+    const auto shown = [&in](bool isTerminal, std::chrono::milliseconds patience) {
+        std::ostringstream out;
+        std::ostringstream err;
+        Console console{out, err, in, isTerminal};
+        ProgressLine line(console, patience);
+        for (const long long done : {0, 1, 50, 400, 800})
+            line.ShowProgress(done, 800);
+        return err.str();
+    };
+    using std::chrono::hours;
+    using std::chrono::milliseconds;
+    EXPECT_EQ(shown(true, milliseconds(0)), "\r0 %\r6 %\r50 %\r     \r");
+    EXPECT_EQ(shown(true, hours(1)), "") << "the work was not long";
+    EXPECT_EQ(shown(false, milliseconds(0)), "");
 }
 
 using Program = CommandTest;

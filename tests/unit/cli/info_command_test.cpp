@@ -71,7 +71,7 @@ TEST_F(InfoCommand, TellsTheExtentOfASeries) {
     // Without the blanks between the parts.
     out.erase(std::remove_if(out.begin(), out.end(), [](char c) { return c == ' ' || c == '\n'; }),
               out.end());
-    EXPECT_EQ(out, R"({"axis":"non-equidistantcalendar","count":4,"title":"gauge",)"
+    EXPECT_EQ(out, R"({"axis":"non-equidistantcalendar","step":null,"count":4,"title":"gauge",)"
                    R"("first":"1990-01-01T00:00:00","last":"1990-03-02T00:00:00",)"
                    R"("longestGap":{"from":"1990-01-01T06:00:30","to":"1990-03-01T00:00:00",)"
                    R"("days":58.749652777777776},"items":[{"name":"Durchfluß","unit":"m3/s",)"
@@ -114,6 +114,32 @@ TEST_F(InfoCommand, CountsMissingValuesOfAFileFromElsewhere) {
     EXPECT_EQ(item["values"], 2);
     EXPECT_EQ(item["missing"], 1);
     EXPECT_EQ(item["maximum"]["value"], 7.0);
+}
+
+TEST_F(InfoCommand, KnowsARegularAxisThatIsStoredTimeByTime) {
+    struct Case {
+        test::Samples samples;
+        std::string axis;
+        std::string step;
+        std::string text;
+    };
+    const Case cases[] = {
+        {test::SamplesOf({{"1990-01-01", 1}, {"1990-01-01 06:00", 2}, {"1990-01-01 12:00", 3}}),
+         "equidistant calendar", "21600.0", "time axis   equidistant, calendar\n"},
+        {test::SamplesOf({{"1990-01-01", 1}, {"1990-01-01 06:00", 2}, {"1990-01-01 12:00:01", 3}}),
+         "non-equidistant calendar", "null", "time axis    non-equidistant, calendar\n"},
+        {test::SamplesOf({{"1990-01-01", 1}, {"1990-01-02", 2}}), "non-equidistant calendar",
+         "null", "time axis    non-equidistant, calendar\n"},
+    };
+    for (const Case& c : cases) {
+        ASSERT_TRUE(test::WriteDataFile(files.Path("s.tsq0"), c.samples));
+        ASSERT_EQ(Run({"info", "s.tsq0", "--json"}), 0) << err;
+        EXPECT_EQ(Json()["axis"], c.axis);
+        EXPECT_EQ(Json()["step"].dump(), c.step);
+        ASSERT_EQ(Run({"info", "s.tsq0"}), 0);
+        EXPECT_THAT(out, HasSubstr(c.text));
+        EXPECT_EQ(out.find("\nstep        6 h\n") != std::string::npos, c.step != "null") << out;
+    }
 }
 
 TEST_F(InfoCommand, WarnsOfStepsThatGoBackwards) {

@@ -1,5 +1,6 @@
 #include "series/tsq_values.h"
 
+#include <algorithm>
 #include <cmath>
 
 #include <gmock/gmock.h>
@@ -50,6 +51,20 @@ class DataFile {
 
 std::string Stamp(const COleDateTime& date) {
     return date.Format("%Y-%m-%d %H:%M:%S");
+}
+
+TEST(TsqValues, TellsHowFarAReadHasCome) {
+    const TemporaryDirectory files;
+    ASSERT_TRUE(
+        WriteDataFile(files.Path("s.tsq0"), Daily("1900-01-01", std::vector<double>(20000, 1.5))));
+    RecordingPorts ports;
+    CTsqValues values;
+    values.UsePorts(ports);
+    ASSERT_TRUE(values.ReadSeries(files.Path("s.tsq0"), 0));
+    ASSERT_GE(ports.progress.size(), 2U);
+    EXPECT_EQ(ports.progress.front(), std::pair(0LL, 20000LL));
+    EXPECT_EQ(ports.progress.back(), std::pair(20000LL, 20000LL));
+    EXPECT_TRUE(std::is_sorted(ports.progress.begin(), ports.progress.end()));
 }
 
 TEST(SeriesReading, StartsAnEquidistantAxisAtItsDateAndOffset) {

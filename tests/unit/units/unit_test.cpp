@@ -128,6 +128,13 @@ TEST(Units, UdunitsKnowsEveryTextOfTheTable) {
     }
 }
 
+TEST(Units, KnowsWhatTheTableOrUdunitsUnderstands) {
+    for (const char* known : {"m3/s", "furlong", "m s-1"})
+        EXPECT_TRUE(IsKnownUnit(UnitOfText(known))) << known;
+    for (const char* unknown : {"blah", "m3/blah", ""})
+        EXPECT_FALSE(IsKnownUnit(UnitOfText(unknown))) << unknown;
+}
+
 TEST(Units, OtherWritingsOfAUnitGetItsCode) {
     const int speed = UnitOfText("m/s");
     for (const char* text : {"m s-1", "m s**-1", "m.s^-1", "meter second-1", "metre/second"})
