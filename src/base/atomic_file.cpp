@@ -147,6 +147,11 @@ void AtomicFile::Discard() {
     mark.Clear();
 }
 
+Status TestAtomicWrite(const std::string& path) {
+    AtomicFile file;
+    return file.Open(path);
+}
+
 Status WriteFileAtomically(const std::string& path, std::string_view content,
                            Durability durability) {
     AtomicFile file;

@@ -57,6 +57,10 @@ class AtomicFile {
     int writeError = 0;
 };
 
+/// Whether a file could be written in this way: it is a regular one or does not exist, and another
+/// can be made beside it. Leaves everything as it is.
+Status TestAtomicWrite(const std::string& path);
+
 /// Writes a whole file through AtomicFile.
 Status WriteFileAtomically(const std::string& path, std::string_view content,
                            Durability durability);

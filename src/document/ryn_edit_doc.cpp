@@ -132,14 +132,29 @@ Status CRynEditDoc::WriteResults(const std::string& baseDirectory) {
                                   durability);
 }
 
+namespace {
+
+/// Whether the file is one of those that the engine writes beside the results.
+bool IsEngineFile(const std::string& path) {
+    const PathParts parts = SplitPath(path);
+    const std::string name = parts.name + parts.extension;
+    return name == "Ryn.log" || name == "Rynout1.txt" || name == "Rynout2.txt";
+}
+
+} // namespace
+
 Status CRynEditDoc::TestResultFileName() const {
     const std::string& result = globalKvf->DefineEVS().OutputFileName;
-    for (const std::string& input :
+    bool isTaken = IsEngineFile(result);
+    // The parameter file's name also where the file is not there yet.
+    if (!GetPathName().empty())
+        isTaken = isTaken || result == SavedParameterFileName(GetPathName(), fileExtension);
+    for (const std::string& other :
          {GetPathName(), globalKvf->DefineEVS().InputFileName,
-          globalKvf->BasicInput().InputFileName, globalKvf->BasicInput().OutputFileName})
-        if (IsSameFile(result, input))
-            return Status::InputFault(FormatText(kTextRunOverInput, result));
-    return Status::Ok();
+          globalKvf->BasicInput().InputFileName, globalKvf->BasicInput().OutputFileName,
+          globalKvf->GridInput().Tsq2InputFile, globalKvf->GridInput().Tsq2OutputFile})
+        isTaken = isTaken || IsSameFile(result, other);
+    return isTaken ? Status::InputFault(FormatText(kTextRunOverInput, result)) : Status::Ok();
 }
 
 void CRynEditDoc::NoteSaveError(Status status) {

@@ -44,8 +44,9 @@ class CRynEditDoc : public CK44SetupDoc {
     /// did, and when they name none.
     const Status& ResultError() const { return resultError; }
 
-    /// A fault when the result file that the parameters name is the parameter file, the data file
-    /// or a series file, which writing the results would destroy.
+    /// A fault when the result file that the parameters name is another file of the analysis (the
+    /// parameter file, a data, series or grid file, one that the engine writes), which writing the
+    /// results would destroy.
     Status TestResultFileName() const;
 
     /// How saves are written; flushed unless told otherwise.

@@ -18,6 +18,8 @@ RunLog::RunLog(const std::string& directory) {
     // Opening a pipe would wait for its reader.
     if (std::filesystem::exists(existing) && !std::filesystem::is_regular_file(existing))
         return;
+    // A new file, which needs a writable directory only: an old log must not pass for this run's.
+    std::filesystem::remove(path, error);
     stream.reset(std::fopen(path.c_str(), "wb"));
 }
 

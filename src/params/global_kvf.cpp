@@ -44,10 +44,12 @@ void CGlobalKvf::Write(KvfTree* file, const std::string& baseDirectory) {
 void CGlobalKvf::WriteExtremeValues(KvfTree* file) {
     const bool fromSeries = !defineEvs.InputFileName.empty();
     const bool fromOutput = !fromSeries && !basicInput.OutputFileName.empty();
+    bool isRead = true;
     if (fromSeries)
-        values.ReadSeries(defineEvs.InputFileName, ItemIndex(defineEvs.InputItem));
+        isRead = values.ReadSeries(defineEvs.InputFileName, ItemIndex(defineEvs.InputItem));
     else if (fromOutput)
-        values.ReadSeries(basicInput.OutputFileName, 0);
+        isRead = values.ReadSeries(basicInput.OutputFileName, 0);
+    seriesError = isRead ? Status::Ok() : values.ReadError();
     values.WriteExtremeValueSection(
         file, [this](const COleDateTime& date) { return analysis.SampleOfDate(date); });
     if (fromSeries || fromOutput)

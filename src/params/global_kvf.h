@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "base/status.h"
 #include "framework/kvf_base.h"
 #include "params/analysis_kvf.h"
 #include "params/basic_input_kvf.h"
@@ -35,6 +36,9 @@ class CGlobalKvf : public CKvfBase {
     CAnalysisKvf& Analysis() { return analysis; }
     CProbabilityDistribKvf& Distributions() { return distributions; }
     CTsq2InputKvf& GridInput() { return gridInput; }
+    /// Why the last Write could not read the series in force, which is then an empty one in the
+    /// tree; Ok when it could, and when there is none.
+    const Status& SeriesError() const { return seriesError; }
     /// Room for the series being extracted or written; empty between user actions.
     CTsqValues& Values() { return values; }
 
@@ -46,6 +50,7 @@ class CGlobalKvf : public CKvfBase {
     CAnalysisKvf analysis;
     CProbabilityDistribKvf distributions;
     CTsqValues values;
+    Status seriesError;
     CTsq2InputKvf gridInput;
 };
 

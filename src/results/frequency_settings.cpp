@@ -17,8 +17,8 @@ void CFrequencySettings::LoadSettings(const KvfSection* settings,
 void CFrequencySettings::LoadOutput(const KvfSection* target,
                                     const std::string& /*baseDirectory*/) {
     const KvfSection* const analysis = kvfSectionByNameNum(target, "DistributionAnalysis", 1);
-    const std::size_t points = LoadCount(analysis, "NoItemPDFPlot");
-    LoadDoubles(analysis, "XvaluePDFPlot", points, &XvaluePDFPlot);
+    LoadDoubles(analysis, "XvaluePDFPlot", LoadCount(analysis, "NoItemPDFPlot"), &XvaluePDFPlot);
+    const std::size_t points = XvaluePDFPlot.size();
     ForEachCombination(target, [this, points](const KvfSection* combination) {
         LoadDoubles(kvfSectionByNameNum(combination, "PDFPlot", 1), "PDF", points,
                     &densities.emplace_back());

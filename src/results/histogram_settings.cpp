@@ -22,13 +22,14 @@ void CHistogramSettings::LoadSettings(const KvfSection* settings,
 void CHistogramSettings::LoadOutput(const KvfSection* target,
                                     const std::string& /*baseDirectory*/) {
     const KvfSection* const section = kvfSectionByNameNum(target, "Histogram", 1);
-    const std::size_t claimed = LoadCount(section, "NoIntHistogram");
     kvfGetParam(section, "XstartHistogram", &XstartHistogram, 1, 1);
     kvfGetParam(section, "XstepHistogram", &XstepHistogram, 1, 1);
-    LoadDoubles(section, "FrequencyHistogram", claimed, &FrequencyHistogram);
-    NoIntHistogram = static_cast<std::int32_t>(FrequencyHistogram.size());
-    ForEachCombination(target, [this, claimed](const KvfSection* combination) {
-        LoadDoubles(kvfSectionByNameNum(combination, "PDFTable", 1), "PDF", claimed,
+    LoadDoubles(section, "FrequencyHistogram", LoadCount(section, "NoIntHistogram"),
+                &FrequencyHistogram);
+    const std::size_t intervals = FrequencyHistogram.size();
+    NoIntHistogram = static_cast<std::int32_t>(intervals);
+    ForEachCombination(target, [this, intervals](const KvfSection* combination) {
+        LoadDoubles(kvfSectionByNameNum(combination, "PDFTable", 1), "PDF", intervals,
                     &estimated.emplace_back());
         GrowSelectedItems(estimated.size(), &SelectedItems);
     });

@@ -72,6 +72,7 @@ void COutputSettings::LoadOutput(const KvfSection* target, const std::string& ba
     if (!GoodnessOfFit.Items().empty())
         Quantiles.SetStatisticFlags(GoodnessOfFit.Items().front());
     valid = true;
+    hasOutput = true;
 }
 
 void COutputSettings::SaveOutput(KvfTree* file) const {
@@ -114,6 +115,7 @@ void COutputSettings::Clear() {
     ItemNames.clear();
     ReturnPeriods.clear();
     valid = false;
+    hasOutput = false;
 }
 
 void COutputSettings::UseMessageFont(const FontRecord& font) {

@@ -42,6 +42,9 @@ class COutputSettings : public CSettingsTemplate {
 
     bool IsValid() const { return valid; }
     void SetValid(bool present) { valid = present; }
+    /// Whether results were taken since the last Clear. A file of display settings alone makes the
+    /// model valid, and there is nothing to show.
+    bool HasOutput() const { return hasOutput; }
 
     /// Gives the pages that start with the platform's message font that font.
     void UseMessageFont(const FontRecord& font);
@@ -72,6 +75,7 @@ class COutputSettings : public CSettingsTemplate {
     void SaveCombination(KvfTree* file, std::size_t index) const;
 
     bool valid = false;
+    bool hasOutput = false;
 };
 
 } // namespace ryn

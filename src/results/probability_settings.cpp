@@ -42,13 +42,13 @@ void CProbabilitySettings::LoadSettings(const KvfSection* settings,
 
 void CProbabilitySettings::LoadObservations(const KvfSection* target) {
     const KvfSection* const section = kvfSectionByNameNum(target, "ProbabilityPlotObs", 1);
-    const std::size_t claimed = LoadCount(section, "Nobs");
-    LoadDoubles(section, "XobsSort", claimed, &XobsSort);
-    Nobs = static_cast<std::int32_t>(XobsSort.size());
-    ForEachItem(section, [this, claimed](const KvfSection* formula) {
+    LoadDoubles(section, "XobsSort", LoadCount(section, "Nobs"), &XobsSort);
+    const std::size_t observations = XobsSort.size();
+    Nobs = static_cast<std::int32_t>(observations);
+    ForEachItem(section, [this, observations](const KvfSection* formula) {
         SProbabilityItem item;
         kvfGetParam(formula, "PlottingMethod", &item.PlottingMethod, 1, 1);
-        LoadDoubles(formula, "ExceedanceProbability", claimed, &item.Probabilities);
+        LoadDoubles(formula, "ExceedanceProbability", observations, &item.Probabilities);
         item.Probabilities = Complements(std::move(item.Probabilities));
         plottingPositions.push_back(std::move(item));
     });
@@ -58,15 +58,16 @@ void CProbabilitySettings::LoadOutput(const KvfSection* target,
                                       const std::string& /*baseDirectory*/) {
     LoadObservations(target);
     const KvfSection* const analysis = kvfSectionByNameNum(target, "DistributionAnalysis", 1);
-    const std::size_t claimed = LoadCount(analysis, "NoItemProbabilityPlot");
-    LoadDoubles(analysis, "ProbabilityPlot", claimed, &ProbabilityPlot);
-    NoItemProbabilityPlot = static_cast<std::int32_t>(ProbabilityPlot.size());
-    ForEachCombination(target, [this, claimed](const KvfSection* combination) {
+    LoadDoubles(analysis, "ProbabilityPlot", LoadCount(analysis, "NoItemProbabilityPlot"),
+                &ProbabilityPlot);
+    const std::size_t points = ProbabilityPlot.size();
+    NoItemProbabilityPlot = static_cast<std::int32_t>(points);
+    ForEachCombination(target, [this, points](const KvfSection* combination) {
         const KvfSection* const plot = kvfSectionByNameNum(combination, "TyearEventPlot", 1);
         SProbDEItem item;
-        LoadDoubles(plot, "TyearEvent", claimed, &item.TyearEvent);
-        LoadDoubles(plot, "AvgTyearEvent", claimed, &item.AvgTyearEvent);
-        LoadDoubles(plot, "StdTyearEvent", claimed, &item.StdTyearEvent);
+        LoadDoubles(plot, "TyearEvent", points, &item.TyearEvent);
+        LoadDoubles(plot, "AvgTyearEvent", points, &item.AvgTyearEvent);
+        LoadDoubles(plot, "StdTyearEvent", points, &item.StdTyearEvent);
         curves.push_back(std::move(item));
         GrowSelectedItems(curves.size(), &SelectedItems);
     });

@@ -25,8 +25,13 @@ void AddSettings(KvfTree* tree, COutputSettings& results, const std::string& bas
     AddTarget(tree, kSettings, [&](KvfTree* open) { results.SaveSettings(open, baseDirectory); });
 }
 
-Status AppendKept(const KvfHandle& kept, const std::string& path, Durability durability) {
-    return kept == nullptr ? Status::Ok() : kvfAppend(kept.get(), path, durability);
+/// Adds a kept plot's target behind what the tree holds.
+void AddKept(KvfTree* tree, const KvfHandle& kept, const char* name) {
+    if (kept == nullptr)
+        return;
+    KvfSection* const copy = kvfAddTarget(tree, name);
+    kvfEndSection(tree);
+    kvfCopy(kvfTargetByNameNum(kept.get(), name, 1), copy);
 }
 
 /// Keeps a copy of a plot's target, which is opaque here.
@@ -65,13 +70,11 @@ Status WriteResultsOfDocument(COutputSettings& results, const std::string& path,
     KvfHandle tree = kvfCreate();
     AddOutput(tree.get(), results);
     AddSettings(tree.get(), results, baseDirectory);
+    // In one write: appended one by one, a kill or a full disk in between would lose a plot's look.
+    AddKept(tree.get(), results.GraphsKvf, kGraphs);
+    AddKept(tree.get(), results.HistogramKvf, kHistogram);
     Status written = kvfWrite(tree.get(), path, durability);
     kvfClose(&tree);
-    // What was not written must not be appended to: the old file's targets would stand twice.
-    if (written)
-        written = AppendKept(results.GraphsKvf, path, durability);
-    if (written)
-        written = AppendKept(results.HistogramKvf, path, durability);
     return written;
 }
 

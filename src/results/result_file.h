@@ -21,7 +21,7 @@ void TakeEngineOutput(KvfHandle* tree, COutputSettings& results);
 /// opens.
 Status WriteResultsOfRun(COutputSettings& results, const std::string& path, Durability durability);
 
-/// On saving the document: results and display settings in one write, then the kept plots.
+/// On saving the document: results, display settings and the kept plots, in one write.
 Status WriteResultsOfDocument(COutputSettings& results, const std::string& path,
                               const std::string& baseDirectory, Durability durability);
 

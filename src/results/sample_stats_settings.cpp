@@ -176,8 +176,10 @@ std::string CSampleStatsSettings::ParametersText() const {
 }
 
 void CSampleStatsSettings::FillText(CQxTextOcxPlot& control) const {
-    control.SetText(GetParent()->Title + '\n' + GetParent()->Subtitle + "\n\n" + StatisticsText() +
-                    ParametersText());
+    std::string text = GetParent()->Title + '\n' + GetParent()->Subtitle + "\n\n";
+    if (GetParent()->HasOutput()) // else there are headings alone, and no numbers
+        text += StatisticsText() + ParametersText();
+    control.SetText(std::move(text));
 }
 
 } // namespace ryn

@@ -3,9 +3,11 @@
 #include <optional>
 #include <utility>
 
+#include "base/atomic_file.h"
 #include "base/file_access.h"
 #include "base/path_parts.h"
 #include "base/qx_path.h"
+#include "document/parameter_file_name.h"
 #include "results/result_file.h"
 #include "strings/catalogue.h"
 
@@ -35,6 +37,8 @@ class Run {
 
   private:
     bool Prepare();
+    bool TestSave();
+    void RefuseOutput(Status reason);
     bool Save();
     void CallEngine();
     void OfferLog();
@@ -71,13 +75,33 @@ bool Run::Prepare() {
     }
     outcome.logFile = LogFileOf(resultFile);
     Status writable = document.TestResultFileName();
+    // Whether both files can be written is found out before the results are emptied.
+    if (writable)
+        writable = TestAtomicWrite(resultFile);
+    if (writable && !TestSave())
+        return false;
     if (writable)
         writable = EmptyFile(resultFile);
-    if (!writable) {
-        ports.messages->Show(MessageKind::Error, std::string(Text(kTextRunOutputUnwritable)));
-        End(RunEnd::OutputUnwritable, std::move(writable));
-    }
+    if (!writable)
+        RefuseOutput(std::move(writable));
     return outcome.end == RunEnd::Succeeded;
+}
+
+void Run::RefuseOutput(Status reason) {
+    ports.messages->Show(MessageKind::Error, std::string(Text(kTextRunOutputUnwritable)));
+    End(RunEnd::OutputUnwritable, std::move(reason));
+}
+
+/// A document without a name has no place yet that could be tested.
+bool Run::TestSave() {
+    if (document.GetPathName().empty())
+        return true;
+    Status writable = TestAtomicWrite(SavedParameterFileName(document.GetPathName(), "RYN"));
+    if (writable)
+        return true;
+    ports.messages->Show(MessageKind::Error, writable.Text());
+    End(RunEnd::SaveFailed, std::move(writable));
+    return false;
 }
 
 /// A document that was never saved gets a name; where the user gives none the command goes on, and
@@ -98,6 +122,9 @@ bool Run::Save() {
             End(RunEnd::SaveFailed, std::move(saved));
         }
     }
+    // The name that was chosen just now may be the result file's.
+    if (Status free = document.TestResultFileName(); outcome.end == RunEnd::Succeeded && !free)
+        RefuseOutput(std::move(free));
     busy.Restore();
     return outcome.end == RunEnd::Succeeded;
 }
@@ -125,6 +152,8 @@ void Run::CallEngine() {
     if (IsFailure(status)) {
         kvfClose(&output);
         outcome.end = RunEnd::EngineFailed;
+        if (outcome.reason)
+            outcome.reason = document.GetGlobalKvf().SeriesError();
         OfferLog();
     } else {
         TakeResults(&output);

@@ -26,7 +26,7 @@ enum class RunEnd {
 struct RunOutcome {
     RunEnd end = RunEnd::Succeeded;
     /// What failed: of OutputUnwritable, SaveFailed, ResultsUnwritten, and of EngineFailed when the
-    /// engine was not reached.
+    /// engine was not reached or the series file could not be read.
     Status reason;
     std::int32_t engineStatus = 0;
     std::string logFile; ///< the engine's log; it can be missing when the engine was not reached

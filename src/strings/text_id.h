@@ -137,6 +137,7 @@ enum TextId : int {
     kTextCliRunWarnings,
     kTextCliRunFailed,
     kTextCliNoLog,
+    kTextCliLogUnwritten,
     kTextCliNotComputed,
     kTextCliNoResults,
     kTextCliNoResultFile,

@@ -1,7 +1,9 @@
 #include "apps/cli/run_command.h"
 
 #include <algorithm>
+#include <chrono>
 #include <cmath>
+#include <filesystem>
 #include <memory>
 #include <ostream>
 #include <sstream>
@@ -25,12 +27,21 @@ namespace {
 
 constexpr std::size_t kLogLinesShown = 20;
 
+/// Whether the engine could write its log: one that was there before is an earlier run's.
+bool IsLogOfThisRun(const std::string& path, std::filesystem::file_time_type start) {
+    // File systems keep times to two seconds at worst.
+    constexpr std::chrono::seconds kCoarsest(2);
+    std::error_code error;
+    const auto written = std::filesystem::last_write_time(path, error);
+    return !error && written >= start - kCoarsest;
+}
+
 /// The last lines of the engine's log, on standard error. The log of a long list of combinations
 /// tells at its end what went wrong.
-void ShowLog(const std::string& path, Console& console) {
+void ShowLog(const std::string& path, bool isOfThisRun, Console& console) {
     constexpr std::size_t kLargestLog = 64U << 20U;
     std::string text;
-    if (!ReadWholeFile(path, kLargestLog, &text)) {
+    if (!isOfThisRun || !ReadWholeFile(path, kLargestLog, &text)) {
         ShowError(console, FormatText(kTextCliNoLog, path));
         return;
     }
@@ -78,8 +89,7 @@ void PrintQuantiles(const COutputSettings& results, std::ostream& out) {
 
 void PrintResults(CaseFile& file, const RunOutcome& outcome, Console& console) {
     const COutputSettings& results = file.Document().Results();
-    console.out << FormatText(kTextCliRunWritten,
-                              PlainLine(file.Root().DefineEVS().OutputFileName),
+    console.out << FormatText(kTextCliRunWritten, PlainLine(file.Root().DefineEVS().OutputFileName),
                               results.SampleStats.SampleSize, results.ItemNames.size())
                 << '\n';
     if (results.ReturnPeriods.empty())
@@ -107,15 +117,12 @@ Json JsonOfRun(CaseFile& file, const RunOutcome& outcome) {
     Json combinations = Json::array();
     const std::vector<SEQItem>& items = results.Quantiles.Items();
     for (std::size_t i = 0; i < std::min(items.size(), results.ItemNames.size()); ++i)
-        combinations.push_back(
-            {{"name", results.ItemNames[i]},
-             {"quantiles", JsonOfQuantiles(items[i], results.ReturnPeriods)}});
-    return {{"status", outcome.engineStatus},
-            {"resultFile", file.Root().DefineEVS().OutputFileName},
-            {"logFile", outcome.logFile},
-            {"count", results.SampleStats.SampleSize},
-            {"unit", results.Unit},
-            {"combinations", std::move(combinations)}};
+        combinations.push_back({{"name", results.ItemNames[i]},
+                                {"quantiles", JsonOfQuantiles(items[i], results.ReturnPeriods)}});
+    return {
+        {"status", outcome.engineStatus}, {"resultFile", file.Root().DefineEVS().OutputFileName},
+        {"logFile", outcome.logFile},     {"count", results.SampleStats.SampleSize},
+        {"unit", results.Unit},           {"combinations", std::move(combinations)}};
 }
 
 /// What stopped the run, as an exit code; its message was shown already.
@@ -147,8 +154,8 @@ void ShowDetail(CaseFile& file, const RunOutcome& outcome, Console& console) {
     }
     if (outcome.end == RunEnd::OutputUnwritable)
         ShowError(console, outcome.reason.Text());
-    if (outcome.end == RunEnd::EngineFailed)
-        ShowLog(outcome.logFile, console);
+    if (outcome.end == RunEnd::EngineFailed && !outcome.reason) // the series, if not the file
+        ShowError(console, outcome.reason.Text());
 }
 
 } // namespace
@@ -158,11 +165,20 @@ int RunRun(const RunOptions& options, Console& console) {
     CaseFile file(console, Consent::Given);
     if (const int refused = file.Open(options.file))
         return refused;
+    const auto start = std::filesystem::file_time_type::clock::now();
     const RunOutcome outcome = RunAnalysis(file.Document());
+    const bool hasLog = IsLogOfThisRun(outcome.logFile, start);
     ShowDetail(file, outcome, console);
-    if (outcome.end == RunEnd::Succeeded && options.form == OutputForm::Json)
+    if (outcome.end == RunEnd::EngineFailed)
+        ShowLog(outcome.logFile, hasLog, console);
+    // What was computed is shown also where the result file could not be written.
+    if (outcome.end != RunEnd::Succeeded && outcome.end != RunEnd::ResultsUnwritten)
+        return ExitCodeOf(outcome);
+    if (!hasLog)
+        ShowWarning(console, FormatText(kTextCliLogUnwritten, outcome.logFile));
+    if (options.form == OutputForm::Json)
         PrintJson(console, JsonOfRun(file, outcome));
-    else if (outcome.end == RunEnd::Succeeded)
+    else
         PrintResults(file, outcome, console);
     return ExitCodeOf(outcome);
 }
