@@ -43,8 +43,8 @@ std::string ItemSectionName(std::size_t number) {
 }
 
 void ForEachItem(const KvfSection* parent, const std::function<void(const KvfSection*)>& visit) {
-    // Ten times what the engine takes. Each becomes some thirty keywords when it is written, so that
-    // a small file of empty sections would grow without bound.
+    // Ten times what the engine takes. Each becomes some thirty keywords when it is written, so
+    // that a small file of empty sections would grow without bound.
     constexpr std::size_t kMostItems = 10'000;
     for (std::size_t number = 1; number <= kMostItems; ++number) {
         const KvfSection* const item = kvfSectionByNameNum(parent, ItemSectionName(number), 1);

@@ -27,8 +27,8 @@ void SaveCount(KvfTree* file, std::string_view keyword, std::size_t count);
 /// "Item1", "Item2", ...
 std::string ItemSectionName(std::size_t number);
 
-/// Calls `visit` with the sections Item1, Item2, ... of `parent`, up to the first that is missing, but
-/// no more than 10 000.
+/// Calls `visit` with the sections Item1, Item2, ... of `parent`, up to the first that is missing,
+/// but no more than 10 000.
 void ForEachItem(const KvfSection* parent, const std::function<void(const KvfSection*)>& visit);
 
 /// The same for the D/E combinations: the item sections of DistributionAnalysis in target

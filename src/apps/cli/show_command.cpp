@@ -31,10 +31,10 @@ std::optional<std::string> PageText(const COutputSettings& results, int page) {
 }
 
 int ReportNoResults(const CaseFile& file, const Status& reason, Console& console) {
-    return Report(console, Status::InputFault(
-                               reason ? FormatText(kTextCliNoResults, file.ShownName())
-                                      : FormatText(kTextCliNoResultFile, file.ShownName(),
-                                                   reason.Text())));
+    return Report(console,
+                  Status::InputFault(
+                      reason ? FormatText(kTextCliNoResults, file.ShownName())
+                             : FormatText(kTextCliNoResultFile, file.ShownName(), reason.Text())));
 }
 
 } // namespace
