@@ -1,5 +1,7 @@
 #include "engine/engine_input.h"
 
+#include <algorithm>
+
 #include <cmath>
 
 #include "engine/plain_text.h"
@@ -226,6 +228,16 @@ void ReadSeries(const SectionReader& reader, EngineInput& input, const Sentences
     input.sampleNumbers = ReadList<int>(reader, "SampleNo", told, GetInt);
 }
 
+/// Values outside both subsamples are left out, which a number of none of them may not have meant.
+void WarnOfSampleNumbers(InputReading& reading) {
+    const std::vector<int>& numbers = reading.input.sampleNumbers;
+    const auto odd = std::count_if(numbers.begin(), numbers.end(),
+                                   [](int number) { return number < 0 || number > 2; });
+    if (odd > 0)
+        reading.warnings.push_back("ExtremeValueSection/SampleNo is neither 0, 1 nor 2 for " +
+                                   std::to_string(odd) + " value(s), which are in no subsample");
+}
+
 } // namespace
 
 InputReading ReadEngineInput(const KvfTree* tree) {
@@ -240,6 +252,7 @@ InputReading ReadEngineInput(const KvfTree* tree) {
     ReadCombinations(MainSection(target, "ProbabilityDistribution", reading.faults), reading);
     ReadSeries(MainSection(target, "ExtremeValueSection", reading.faults), reading.input,
                reading.faults);
+    WarnOfSampleNumbers(reading);
     ReadGridInput(target, reading);
     return reading;
 }

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "base/number_text.h"
 #include "engine/plain_text.h"
 
 namespace ryn {
@@ -75,9 +76,9 @@ Sentences SeriesWarnings(const EngineInput& input, const SeriesResults& series) 
     AddObstacle(warnings, "test for shift in mean", series.shift);
     for (std::size_t i = 0; i < input.periods.size(); ++i)
         if (std::isnan(series.exceedances[i]))
-            warnings.push_back("no event has a return period of " + NumberText(input.periods[i]) +
+            warnings.push_back("no event has a return period of " + PeriodText(input.periods[i]) +
                                " years: it must be a number greater than " +
-                               NumberText(ShortestPeriod(input)));
+                               ShortestText(ShortestPeriod(input)));
     return warnings;
 }
 

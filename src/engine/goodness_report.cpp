@@ -91,6 +91,7 @@ void AppendChiSquared(std::string& text, const stats::ChiSquaredTest& test) {
                          std::to_string(c.observed), SixDigits(test.expected),
                          SixDigits(c.contribution)});
     }
+    AppendValue(text, "Classes", std::to_string(test.classes.size()));
     AppendValue(text, "Statistic", SixDigits(test.statistic));
     AppendValue(text, "Degrees of freedom", std::to_string(test.degreesOfFreedom));
     AppendValue(text, "Level [%]", SixDigits(test.level));

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 
+#include "base/number_text.h"
 #include "engine/plain_text.h"
 #include "stats/monte_carlo.h"
 
@@ -25,8 +26,8 @@ std::string SeriesLine(const EngineInput& input) {
 std::string KindLine(const EngineInput& input) {
     if (input.frame.kind == SeriesKind::AnnualMaximum)
         return "Kind: annual maxima";
-    return "Kind: partial durations, threshold " + NumberText(input.threshold) + UnitSuffix(input) +
-           ", " + NumberText(input.averageNumber) + " events a year";
+    return "Kind: partial durations, threshold " + ShortestText(input.threshold) +
+           UnitSuffix(input) + ", " + FixedText(input.averageNumber, 4) + " events a year";
 }
 
 // Whether T counts events or annual maxima moves a quantile by much at short periods.
@@ -35,7 +36,7 @@ std::string PeriodsLine(const EngineInput& input) {
     std::string line = "Return periods in years: ";
     const std::size_t shown = std::min(input.periods.size(), kMostShown);
     for (std::size_t i = 0; i < shown; ++i)
-        line += (i == 0 ? "" : ", ") + NumberText(input.periods[i]);
+        line += (i == 0 ? "" : ", ") + PeriodText(input.periods[i]);
     if (input.periods.empty())
         line += "none";
     if (shown < input.periods.size())
@@ -47,14 +48,15 @@ std::string PeriodsLine(const EngineInput& input) {
 }
 
 // With what somebody needs who wants the same numbers from another program.
-std::string UncertaintyLine(UncertaintyMethod method) {
+std::string UncertaintyLine(UncertaintyMethod method, std::size_t count) {
     const stats::MonteCarloSettings settings;
     switch (method) {
     case UncertaintyMethod::MonteCarlo:
         return "Uncertainty: Monte Carlo (parametric bootstrap), " +
                std::to_string(settings.samples) + " samples, seed " + std::to_string(settings.seed);
     case UncertaintyMethod::Jackknife:
-        return "Uncertainty: jackknife";
+        return "Uncertainty: jackknife, each of " + std::to_string(count) +
+               " values left out in turn";
     case UncertaintyMethod::None:
         break;
     }
@@ -122,7 +124,7 @@ Sentences SummaryLines(const EngineInput& input) {
     return {SeriesLine(input),
             KindLine(input),
             PeriodsLine(input),
-            UncertaintyLine(input.uncertainty),
+            UncertaintyLine(input.uncertainty, input.values.size()),
             "Plotting positions: " + std::string(NameOf(input.plotting)),
             "Combinations: " + std::to_string(input.combinations.size())};
 }

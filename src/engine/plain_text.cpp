@@ -63,4 +63,11 @@ std::string NumberText(double value) {
     return ShortestText(static_cast<float>(value));
 }
 
+std::string PeriodText(double years) {
+    constexpr double kLongestPlain = 1e9;
+    const bool isPlain =
+        std::isfinite(years) && std::fabs(years) < kLongestPlain && years == std::floor(years);
+    return isPlain ? FixedText(years, 0) : ShortestText(years);
+}
+
 } // namespace ryn

@@ -36,7 +36,7 @@ void AppendQuantile(std::string& text, double period, double exceedance,
                     const stats::ResampledQuantile& quantile) {
     constexpr double kNormal95 = 1.96; // half width of the central 95 % in standard deviations
     const double margin = kNormal95 * quantile.standardDeviation;
-    AppendRow(text, {ShortestText(period), SixDigits(exceedance), SixDigits(quantile.estimate),
+    AppendRow(text, {PeriodText(period), SixDigits(exceedance), SixDigits(quantile.estimate),
                      SixDigits(quantile.average), SixDigits(quantile.bias),
                      SixDigits(quantile.standardDeviation), SixDigits(quantile.estimate - margin),
                      SixDigits(quantile.estimate + margin)});
@@ -61,8 +61,10 @@ std::string QuantileReportHead(const EngineInput& input) {
            (input.frame.kind == stats::SeriesKind::AnnualMaximum ? "the maximum of a year"
                                                                  : "a peak above the threshold") +
            "\nexceeds the T-year event.\n\n" + std::string(MethodNotes(input.uncertainty)) +
-           "lower and upper: estimate -+ 1.96 deviations, some 95 % where estimates are normal; "
-           "those of a heavy\ntail are skewed, so that upper is too low.\n";
+           (input.uncertainty == UncertaintyMethod::None
+                ? ""
+                : "lower and upper: estimate -+ 1.96 deviations, some 95 % where estimates are "
+                  "normal;\nthose of a heavy tail are skewed, so that upper is too low.\n");
 }
 
 std::string QuantileReportOf(const EngineInput& input, std::size_t index,

@@ -60,11 +60,22 @@ void AppendValue(std::string& text, std::string_view name, std::string_view valu
     text += '\n';
 }
 
+namespace {
+
+/// Characters, not bytes: names come in any script.
+std::size_t CharacterCount(std::string_view text) {
+    return static_cast<std::size_t>(std::count_if(text.begin(), text.end(), [](char byte) {
+        return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U;
+    }));
+}
+
+} // namespace
+
 void AppendHeading(std::string& text, std::string_view heading, char underline) {
     text += '\n';
     text += heading;
     text += '\n';
-    text.append(heading.size(), underline);
+    text.append(CharacterCount(heading), underline);
     text += '\n';
 }
 

@@ -1,11 +1,16 @@
 #include "engine/rynengine.h"
 
 #include <exception>
+#include <filesystem>
 #include <new>
 #include <string>
+#include <string_view>
+#include <system_error>
 
 #include "engine/engine_directory.h"
 #include "engine/engine_run.h"
+#include "engine/goodness_report.h"
+#include "engine/quantile_report.h"
 #include "engine/run_log.h"
 
 namespace ryn {
@@ -25,11 +30,24 @@ EngineStatus RunCaught(const KvfTree* tree, KvfHandle* output, const std::string
     return EngineStatus::SetUpFailed;
 }
 
+// An earlier run's reports must not pass for this one's, whatever happens before they are written.
+void RemoveReports(const std::string& directory) {
+    if (directory.empty())
+        return;
+    for (const std::string_view name : {kGoodnessReportName, kQuantileReportName}) {
+        const std::filesystem::path path = directory + std::string(name);
+        std::error_code error;
+        if (std::filesystem::is_regular_file(path, error))
+            std::filesystem::remove(path, error);
+    }
+}
+
 // The last line stands in the log whatever happened in between.
 EngineStatus RunLogged(const KvfTree* tree, KvfHandle* output) {
     // First of all, so that whatever is wrong with the rest of the tree can be told.
     const std::string directory = EngineDirectory(tree);
     RunLog log(directory);
+    RemoveReports(directory);
     log.Line(ProgramText());
     log.Line(NowText());
     const EngineStatus status = RunCaught(tree, output, directory, log);

@@ -87,11 +87,12 @@ void CIndependenceHomSettings::SaveOutput(KvfTree* file) const {
 void CIndependenceHomSettings::FillText(CQxTextOcxPlot& control) const {
     std::string text = GetParent()->Title + '\n' + GetParent()->Subtitle + "\n\n";
     // The first two headings are English in every language, and the last test ends the page.
-    if (RunTest)
+    const bool hasOutput = GetParent()->HasOutput(); // else there is nothing but the headings
+    if (hasOutput && RunTest)
         text += TestLines("Run test:", Run) + '\n';
-    if (TestTrend)
+    if (hasOutput && TestTrend)
         text += TestLines("Test for trend:", Trend) + '\n';
-    if (TestShift)
+    if (hasOutput && TestShift)
         text += TestLines(Text(kTextShiftInMean), Shift);
     control.SetText(std::move(text));
 }

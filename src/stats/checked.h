@@ -2,6 +2,7 @@
 
 #include "stats/fit_outcome.h"
 
+#include <cmath>
 #include <limits>
 #include <optional>
 
@@ -22,6 +23,12 @@ inline FitFailure SkewnessOutOfRange(double skewness) {
 }
 
 /// Failure C08 with its numbers: L-Cv and L-skewness of the sample.
+/// Whether a distribution can have this L-skewness. A sample of equal values but one has exactly 1,
+/// and rounding makes a little less of it.
+inline bool IsLSkewness(double lSkewness) {
+    return std::fabs(lSkewness) < 1 - 1e-12;
+}
+
 inline FitFailure LMomentsOutOfRange(double lCv, double lSkewness) {
     return {FitFault::LMomentsOutOfRange, {lCv, lSkewness}};
 }

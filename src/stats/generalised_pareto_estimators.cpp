@@ -30,7 +30,7 @@ Outcome<GeneralisedPareto> ParetoFromMoments(const CentralMoments& moments) {
 // and the three solve in closed form.
 Outcome<GeneralisedPareto> ParetoFromLMoments(const LMoments& moments) {
     const double t3 = moments.LSkewness();
-    if (!(t3 > -1 && t3 < 1)) {
+    if (!IsLSkewness(t3)) {
         return LMomentsOutOfRange(moments.LCv(), t3);
     }
     const double kappa = (1 - 3 * t3) / (1 + t3);

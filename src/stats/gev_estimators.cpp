@@ -46,7 +46,7 @@ Outcome<Gev> GevFromMoments(const CentralMoments& moments) {
 Outcome<Gev> GevFromLMoments(const LMoments& moments) {
     const double t3 = moments.LSkewness();
     const FitFailure outside = LMomentsOutOfRange(moments.LCv(), t3);
-    if (!(t3 > -1 && t3 < 1)) {
+    if (!IsLSkewness(t3)) {
         return outside;
     }
     const auto excess = [t3](double kappa) { return GevLSkewness(kappa) - t3; };

@@ -26,9 +26,9 @@ TEST(EngineLog, TellsTheSetUpAndEachCombination) {
         WithoutDate(run.Log()),
         "Ryn extreme value analysis, version 0.1.0\n"
         "Series: Water level [m], 44 values\n"
-        "Kind: partial durations, threshold 40 m, 0.9166667 events a year\n"
+        "Kind: partial durations, threshold 40 m, 0.9167 events a year\n"
         "Return periods in years: 10, 50, 100 (of an event)\n"
-        "Uncertainty: jackknife\n"
+        "Uncertainty: jackknife, each of 44 values left out in turn\n"
         "Plotting positions: Cunnane\n"
         "Combinations: 3\n"
         "EXP1/MOM: ok\n"

@@ -113,6 +113,15 @@ TEST(PageText, HeadingsOfTwoTestsStayEnglishInJapanese) {
     EXPECT_NE(page.find("6.25%"), std::string::npos);
 }
 
+TEST(PageText, ShowsHeadingsAloneWithoutResults) {
+    COutputSettings results; // as a file of display settings leaves it
+    results.SetValid(true);
+    results.Independence.RunTest = true;
+    results.SampleStats.SelectedItems = {true};
+    EXPECT_EQ(IndependencePage(results), "\n\n\n");
+    EXPECT_EQ(StatisticsPage(results), "\n\n\n");
+}
+
 TEST(PageText, IsExportedLineByLine) {
     CQxTextOcxPlot control;
     control.SetText("first\n\nthird \"quoted\"\n");

@@ -39,6 +39,15 @@ TEST(Fit, RefusesWhatTheKindOfSeriesDoesNotOffer) {
     }
 }
 
+TEST(Fit, RefusesAllEqualButOneWhateverTheRounding) {
+    for (const std::size_t count : {5U, 6U, 7U, 20U}) {
+        std::vector<double> values(count, 5.0);
+        values.back() = 6.0;
+        for (const char* name : {"GP/LMOM", "GEV/LMOM"})
+            EXPECT_EQ(Failing(name, values, kAnnual).substr(0, 3), "C08") << name << count;
+    }
+}
+
 TEST(Fit, RefusesWhatTheDistributionDoesNotOffer) {
     const std::string text = "C02 estimation method is not offered for this distribution";
     const auto annual = ReferenceSeries("portpirie");
