@@ -17,8 +17,8 @@ using Side = GevProfile::Side;
 std::optional<Peak> HighestPeak(std::span<const double> deviations) {
     constexpr double kLargestShape = 0.98;
     PeakSearch search;
-    search.Walk(GevProfile(deviations, Side::UpperBound), 0, kLargestShape, 8);
-    search.Walk(GevProfile(deviations, Side::LowerBound), 0, -kLargestShape, 6);
+    search.Walk(GevProfile(deviations, Side::UpperBound), 0, kLargestShape, 6);
+    search.Walk(GevProfile(deviations, Side::LowerBound), 0, -kLargestShape, 4);
     return search.Highest();
 }
 

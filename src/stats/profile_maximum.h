@@ -63,10 +63,24 @@ std::optional<Peak> MaximumBetween(F&& profile, Bracket bracket, double start) {
     return std::nullopt;
 }
 
+/// MaximumBetween for a profile with one maximum of which nobody knows whether it lies inside
+/// `bracket`: nothing when it does not. `start` may lie outside.
+template <class F>
+std::optional<Peak> PeakInside(F&& profile, Bracket bracket, double start) {
+    constexpr double kMargin = 1e-8;
+    const bool usable = start > bracket.lower && start < bracket.upper;
+    const double middle = bracket.lower + (bracket.upper - bracket.lower) / 2;
+    const auto peak = MaximumBetween(profile, bracket, usable ? start : middle);
+    const bool inside =
+        peak && peak->place > bracket.lower + kMargin && peak->place < bracket.upper - kMargin;
+    return inside ? peak : std::nullopt;
+}
+
 /// Walks a profile and keeps the highest local maximum that it meets. Profiles of likelihoods are
 /// smooth: over a step that is short against their features, a maximum shows as a change of sign of
-/// the slope. Where the cubic through both ends with their slopes bends back between them, or
-/// nearly so, the step is halved, so that a maximum with its minimum close by is not passed over.
+/// the slope. Where slopes and curvatures say that the slope may bend through 0 and back between
+/// two stations, the step is halved, so that a maximum with its minimum close by is not passed
+/// over.
 class PeakSearch {
   public:
     /// The highest so far; nothing when none was met.
@@ -96,13 +110,20 @@ class PeakSearch {
         ProfilePoint at;
     };
 
-    static constexpr int kMostHalvings = 3;
+    static constexpr int kMostHalvings = 5;
 
     void NoteEnd(const Station& end) { highestEnd = std::max(highestEnd, end.at.value); }
 
-    // Whether the cubic through both ends, whose slope is q(s) = d0 + (d1 - d0 + 6 e) s - 6 e s^2,
-    // comes down to a fifth of the smaller end's slope in between; both slopes have one sign.
-    static bool MayBendBack(const Station& a, const Station& b) {
+    // Whether Newton's method finds a maximum or a minimum from `a` before half the way to `b`.
+    static bool TurnsSoon(const Station& a, const Station& b) {
+        const double share = -a.at.slope / a.at.curvature / (b.place - a.place);
+        return share > 0 && share < 0.5;
+    }
+
+    // Whether the cubic through both ends, whose slope in shares s of the way is
+    //     q(s) = d0 + (d1 - d0 + 6 e) s - 6 e s^2,
+    // comes down to a fifth of the smaller slope at the ends.
+    static bool CubicBendsBack(const Station& a, const Station& b) {
         const double sign = a.at.slope > 0 ? 1 : -1;
         const double d0 = sign * a.at.slope;
         const double d1 = sign * b.at.slope;
@@ -120,7 +141,8 @@ class PeakSearch {
         }
         if (a.at.slope > 0 && b.at.slope <= 0) {
             Climb(profile, a, b);
-        } else if (a.at.slope * b.at.slope > 0 && halvings > 0 && MayBendBack(a, b)) {
+        } else if (a.at.slope * b.at.slope > 0 && halvings > 0 &&
+                   (CubicBendsBack(a, b) || TurnsSoon(a, b) || TurnsSoon(b, a))) {
             const double place = a.place + (b.place - a.place) / 2;
             const Station middle{place, profile(place)};
             Look(profile, a, middle, halvings - 1);
