@@ -1,5 +1,6 @@
 #include "stats/standard_gamma.h"
 
+#include "stats/incomplete_gamma.h"
 #include "stats/normal_functions.h"
 #include "stats/quiet_policy.h"
 
@@ -57,11 +58,11 @@ double StandardGamma::LogDensity(double z) const {
 }
 
 double StandardGamma::Lower(double z) const {
-    return std::isinf(z) ? 1.0 : boost::math::gamma_p(kappa, z, QuietPolicy());
+    return LowerGamma(kappa, z);
 }
 
 double StandardGamma::Upper(double z) const {
-    return std::isinf(z) ? 0.0 : boost::math::gamma_q(kappa, z, QuietPolicy());
+    return UpperGamma(kappa, z);
 }
 
 // Each is solved in the tail that the probability lies in; from 1/2 on the complement is exact.
