@@ -1,3 +1,4 @@
+#include "stats/checked.h"
 #include "stats/exceedances.h"
 #include "stats/likelihood_estimators.h"
 #include "stats/profile_maximum.h"
@@ -43,8 +44,8 @@ double LogMeanLessMeanLog(std::span<const double> values) {
 // With alpha = mean(y)/k, its best value for a given shape, the slope of l/n in ln k is
 //     k (ln k - psi(k) - c),  c = ln mean(y) - mean(ln y)
 // with one root for c > 0. Thom's (1958) approximation is the start.
-Outcome<LocationScaleShape> MostLikelyGammaAbove(double threshold, std::span<const double> values,
-                                                 LikelihoodBuffer& buffer) {
+Outcome<PearsonThree> MostLikelyGammaAbove(double threshold, std::span<const double> values,
+                                           LikelihoodBuffer& buffer) {
     const auto exceedances = ExceedancesOf(values, threshold, ZeroExceedances::LeftOut, buffer);
     if (!exceedances) {
         return exceedances.Failure();
@@ -62,7 +63,7 @@ Outcome<LocationScaleShape> MostLikelyGammaAbove(double threshold, std::span<con
         return FitFailure{FitFault::NoInteriorMaximum};
     }
     const double k = std::exp(peak->place);
-    return LocationScaleShape{threshold, exceedances->mean / k, k};
+    return Checked(PearsonThree::Make({threshold, exceedances->mean / k, k}, LocationType::Fixed));
 }
 
 } // namespace ryn::stats

@@ -1,10 +1,14 @@
 #pragma once
 
-#include "stats/exponential.h"
 #include "stats/fit_outcome.h"
 #include "stats/generalised_pareto.h"
 #include "stats/gev.h"
 #include "stats/gumbel.h"
+#include "stats/log_normal.h"
+#include "stats/pearson_three.h"
+#include "stats/square_root_exponential.h"
+#include "stats/truncated_gumbel.h"
+#include "stats/weibull.h"
 
 #include <span>
 #include <vector>
@@ -38,59 +42,45 @@ Outcome<GeneralisedPareto> MostLikelyParetoAbove(double threshold, std::span<con
 // The estimators above a threshold that follow leave out values equal to it, which have no
 // logarithm as exceedances; ValuesAtThreshold where that would be more than a tenth.
 
-/// alpha and kappa of a Weibull distribution above `threshold`; kappa from 1e-3 to 1e3. The
+/// Two parameters above `threshold`; kappa from 1e-3 to 1e3. The
 /// likelihood has one maximum. Fails: MeanExceedanceNotPositive, ValuesAtThreshold.
-Outcome<LocationScaleShape> MostLikelyWeibullAbove(double threshold, std::span<const double> values,
-                                                   LikelihoodBuffer& buffer);
+Outcome<Weibull> MostLikelyWeibullAbove(double threshold, std::span<const double> values,
+                                        LikelihoodBuffer& buffer);
 
-/// alpha and kappa of a gamma distribution above `threshold` (Thom 1958); kappa from 1e-6 to 1e8.
+/// The gamma distribution above `threshold` (Thom 1958); kappa from 1e-6 to 1e8.
 /// The likelihood has one maximum. Fails: MeanExceedanceNotPositive, ValuesAtThreshold.
-Outcome<LocationScaleShape> MostLikelyGammaAbove(double threshold, std::span<const double> values,
-                                                 LikelihoodBuffer& buffer);
-
-struct LogNormalEstimate {
-    double xi;
-    double mu;
-    double sigma;
-};
+Outcome<PearsonThree> MostLikelyGammaAbove(double threshold, std::span<const double> values,
+                                           LikelihoodBuffer& buffer);
 
 /// Mean and standard deviation (divisor n) of ln(x - lowerBound).
 /// Fails: MeanExceedanceNotPositive, ValuesAtThreshold.
-Outcome<LogNormalEstimate> MostLikelyLogNormalAbove(double lowerBound,
-                                                    std::span<const double> values,
-                                                    LikelihoodBuffer& buffer);
+Outcome<LogNormal> MostLikelyLogNormalAbove(double lowerBound, std::span<const double> values,
+                                            LikelihoodBuffer& buffer);
 
 /// Three parameters (Cohen 1951; Calitz 1973; Griffiths 1980). The likelihood is unbounded towards
 /// xi = the smallest value; the estimate is the highest local maximum with xi between 1e-4 and 1e3
 /// standard deviations of the sample below it. Fails: NoInteriorMaximum, as a sample does that is
 /// not skewed to the right; LowerBoundTooHigh where xi rounds to the smallest value.
-Outcome<LogNormalEstimate> MostLikelyLogNormal(std::span<const double> values,
-                                               LikelihoodBuffer& buffer);
-
-struct SquareRootExponentialEstimate {
-    double a;
-    double b;
-};
+Outcome<LogNormal> MostLikelyLogNormal(std::span<const double> values, LikelihoodBuffer& buffer);
 
 /// Etoh, Murota and Nakanishi (1986); b from 1e-3 to 1e5 over the mean. Values may be 0, not all.
 /// Fails: ValuesNotPositive, NoInteriorMaximum.
-Outcome<SquareRootExponentialEstimate>
-MostLikelySquareRootExponential(std::span<const double> values, LikelihoodBuffer& buffer);
+Outcome<SquareRootExponential> MostLikelySquareRootExponential(std::span<const double> values,
+                                                               LikelihoodBuffer& buffer);
 
 /// What a truncated Gumbel distribution has become. A sample whose tail is at least as heavy as the
 /// exponential's has its highest likelihood in that limit, where xi goes to minus infinity.
 enum class TruncatedTail { Gumbel, Exponential };
 
-struct TruncatedGumbelEstimate {
-    double xi; ///< threshold - 20 alpha for TruncatedTail::Exponential
-    double alpha;
+struct TruncatedGumbelFit {
+    TruncatedGumbel distribution; ///< xi = threshold - 20 alpha for TruncatedTail::Exponential
     TruncatedTail tail;
 };
 
 /// A Gumbel distribution of which only the part above `threshold` is seen; alpha from 0.05 to 20
 /// mean exceedances. Fails: MeanExceedanceNotPositive, NoInteriorMaximum.
-Outcome<TruncatedGumbelEstimate> MostLikelyTruncatedGumbel(double threshold,
-                                                           std::span<const double> values,
-                                                           LikelihoodBuffer& buffer);
+Outcome<TruncatedGumbelFit> MostLikelyTruncatedGumbel(double threshold,
+                                                      std::span<const double> values,
+                                                      LikelihoodBuffer& buffer);
 
 } // namespace ryn::stats

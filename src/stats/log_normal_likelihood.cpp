@@ -1,3 +1,4 @@
+#include "stats/checked.h"
 #include "stats/exceedances.h"
 #include "stats/likelihood_estimators.h"
 #include "stats/profile_maximum.h"
@@ -80,9 +81,8 @@ class LowerBoundProfile {
 
 } // namespace
 
-Outcome<LogNormalEstimate> MostLikelyLogNormalAbove(double lowerBound,
-                                                    std::span<const double> values,
-                                                    LikelihoodBuffer& buffer) {
+Outcome<LogNormal> MostLikelyLogNormalAbove(double lowerBound, std::span<const double> values,
+                                            LikelihoodBuffer& buffer) {
     const auto above = ExceedancesOf(values, lowerBound, ZeroExceedances::LeftOut, buffer);
     if (!above) {
         return above.Failure();
@@ -91,13 +91,13 @@ Outcome<LogNormalEstimate> MostLikelyLogNormalAbove(double lowerBound,
     if (!(deviation > 0)) {
         return FitFailure{FitFault::NoInteriorMaximum};
     }
-    return LogNormalEstimate{lowerBound, mean + std::log(above->mean), deviation};
+    return Checked(LogNormal::Make({lowerBound, mean + std::log(above->mean), deviation},
+                                   LocationType::Fixed));
 }
 
 // Towards the smallest value the likelihood grows without limit and downwards it goes to that of a
 // normal distribution: of both ends nothing is made.
-Outcome<LogNormalEstimate> MostLikelyLogNormal(std::span<const double> values,
-                                               LikelihoodBuffer& buffer) {
+Outcome<LogNormal> MostLikelyLogNormal(std::span<const double> values, LikelihoodBuffer& buffer) {
     const double smallest = *std::min_element(values.begin(), values.end());
     const double unit = CentralMomentsOf(values).StandardDeviation();
     if (!std::isfinite(unit)) {
@@ -122,7 +122,7 @@ Outcome<LogNormalEstimate> MostLikelyLogNormal(std::span<const double> values,
         return FitFailure{FitFault::LowerBoundTooHigh, {xi, smallest}};
     }
     const auto [mean, deviation] = profile.At(t);
-    return LogNormalEstimate{xi, mean + std::log(unit), deviation};
+    return Checked(LogNormal::Make({xi, mean + std::log(unit), deviation}));
 }
 
 } // namespace ryn::stats

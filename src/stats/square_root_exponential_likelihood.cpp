@@ -1,3 +1,4 @@
+#include "stats/checked.h"
 #include "stats/likelihood_estimators.h"
 #include "stats/profile_maximum.h"
 
@@ -51,8 +52,8 @@ ProfilePoint ProfileAt(const Means& means, double t) {
 
 } // namespace
 
-Outcome<SquareRootExponentialEstimate>
-MostLikelySquareRootExponential(std::span<const double> values, LikelihoodBuffer& buffer) {
+Outcome<SquareRootExponential> MostLikelySquareRootExponential(std::span<const double> values,
+                                                               LikelihoodBuffer& buffer) {
     double sum = 0;
     for (const double x : values) {
         sum += x;
@@ -79,7 +80,7 @@ MostLikelySquareRootExponential(std::span<const double> values, LikelihoodBuffer
         return FitFailure{FitFault::NoInteriorMaximum};
     }
     const double t = search.Highest()->place;
-    return SquareRootExponentialEstimate{std::exp(LogA(meansAt(t))), std::exp(t) / mean};
+    return Checked(SquareRootExponential::Make({std::exp(LogA(meansAt(t))), std::exp(t) / mean}));
 }
 
 } // namespace ryn::stats

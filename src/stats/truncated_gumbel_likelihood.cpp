@@ -1,3 +1,4 @@
+#include "stats/checked.h"
 #include "stats/exceedances.h"
 #include "stats/likelihood_estimators.h"
 #include "stats/profile_maximum.h"
@@ -104,9 +105,9 @@ ProfilePoint TruncatedGumbelProfile::operator()(double logAlpha) const {
 
 } // namespace
 
-Outcome<TruncatedGumbelEstimate> MostLikelyTruncatedGumbel(double threshold,
-                                                           std::span<const double> values,
-                                                           LikelihoodBuffer& buffer) {
+Outcome<TruncatedGumbelFit> MostLikelyTruncatedGumbel(double threshold,
+                                                      std::span<const double> values,
+                                                      LikelihoodBuffer& buffer) {
     const auto exceedances = ExceedancesOf(values, threshold, ZeroExceedances::Kept, buffer);
     if (!exceedances) {
         return exceedances.Failure();
@@ -120,10 +121,12 @@ Outcome<TruncatedGumbelEstimate> MostLikelyTruncatedGumbel(double threshold,
     const double logAlpha = search.Highest()->place;
     const double c = profile.CAt(logAlpha);
     const double alpha = exceedances->mean * std::exp(logAlpha);
-    if (c == 0) {
-        return TruncatedGumbelEstimate{threshold - 20 * alpha, alpha, TruncatedTail::Exponential};
+    const double xi = threshold + alpha * (c > 0 ? std::log(c) : -20);
+    const auto made = Checked(TruncatedGumbel::Make({xi, alpha}, threshold));
+    if (!made) {
+        return made.Failure();
     }
-    return TruncatedGumbelEstimate{threshold + alpha * std::log(c), alpha, TruncatedTail::Gumbel};
+    return TruncatedGumbelFit{*made, c > 0 ? TruncatedTail::Gumbel : TruncatedTail::Exponential};
 }
 
 } // namespace ryn::stats

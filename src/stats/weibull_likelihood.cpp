@@ -1,3 +1,4 @@
+#include "stats/checked.h"
 #include "stats/exceedances.h"
 #include "stats/likelihood_estimators.h"
 #include "stats/profile_maximum.h"
@@ -60,8 +61,8 @@ ProfilePoint ProfileAt(std::span<const double> logs, double meanLog, double logK
 } // namespace
 
 // The logarithm of a Weibull variable has the standard deviation pi/(k sqrt 6): the start.
-Outcome<LocationScaleShape> MostLikelyWeibullAbove(double threshold, std::span<const double> values,
-                                                   LikelihoodBuffer& buffer) {
+Outcome<Weibull> MostLikelyWeibullAbove(double threshold, std::span<const double> values,
+                                        LikelihoodBuffer& buffer) {
     const auto exceedances = ExceedancesOf(values, threshold, ZeroExceedances::LeftOut, buffer);
     if (!exceedances) {
         return exceedances.Failure();
@@ -81,7 +82,8 @@ Outcome<LocationScaleShape> MostLikelyWeibullAbove(double threshold, std::span<c
     const double k = std::exp(peak->place);
     const auto n = static_cast<double>(buffer.size());
     const double alpha = std::exp(std::log(SumsAt(buffer, k).weight / n) / k);
-    return LocationScaleShape{threshold, exceedances->mean * exceedances->largest * alpha, k};
+    return Checked(Weibull::Make({threshold, exceedances->mean * exceedances->largest * alpha, k},
+                                 LocationType::Fixed));
 }
 
 } // namespace ryn::stats

@@ -80,9 +80,9 @@ inline std::optional<double> SearchGrid(const Profile& f, const std::vector<doub
 }
 
 inline std::vector<double> Equidistant(double from, double to, int count) {
-    std::vector<double> grid;
+    std::vector<double> grid(static_cast<std::size_t>(count), from);
     for (int i = 0; i < count; ++i) {
-        grid.push_back(from + (to - from) * i / (count - 1));
+        grid[static_cast<std::size_t>(i)] += (to - from) * i / (count - 1);
     }
     return grid;
 }
@@ -127,9 +127,9 @@ inline std::optional<double> SearchLogNormal(Values x) {
     const double s = CentralMomentsOf(x).StandardDeviation();
     const auto n = static_cast<double>(x.size());
     const auto height = [&](double t) {
-        std::vector<double> logs;
-        for (const double v : x) {
-            logs.push_back(std::log(v - smallest + s * std::exp(t)));
+        std::vector<double> logs(x.begin(), x.end());
+        for (double& v : logs) {
+            v = std::log(v - smallest + s * std::exp(t));
         }
         const CentralMoments m = CentralMomentsOf(logs);
         return -n / 2 * (std::log(2 * std::acos(-1.0) * m.m2) + 1) - n * m.mean;
@@ -154,7 +154,7 @@ inline std::optional<double> SearchSquareRootExponential(Values x) {
                       GridRule::HighestOfAll);
 }
 
-/// Truncated Gumbel, in ln alpha; for each the best ln c by golden section.
+/// Truncated Gumbel, in ln alpha; for each the best ln c by golden section, if c is below 700.
 inline std::optional<double> SearchTruncatedGumbel(Values y) {
     const double mean = MeanOf(y, [](double v) { return v; });
     const auto n = static_cast<double>(y.size());
@@ -165,7 +165,8 @@ inline std::optional<double> SearchTruncatedGumbel(Values y) {
             const double c = std::exp(logC);
             return n * (-std::log(alpha) - mean / alpha - c * a + std::log(-c / std::expm1(-c)));
         };
-        return GoldenSection(inC, -20, std::log(700.0));
+        return a > 1.0 / 700 ? GoldenSection(inC, -20, std::log(700.0))
+                             : -std::numeric_limits<double>::infinity();
     };
     return SearchGrid(height, Equidistant(std::log(0.05 * mean), std::log(20 * mean), 200),
                       GridRule::HighestOfAll);

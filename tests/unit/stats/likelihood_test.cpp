@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
+#include <limits>
 #include <string>
 #include <vector>
 
@@ -32,9 +33,9 @@ struct Subject {
 };
 
 const Subject kSubjects[] = {
-    {"GEV/ML", kAnnual},
-    {"GUM/ML", kAnnual},
-    {"GP2/ML", kPeaks},
+    {"GEV/ML", kAnnual}, {"GUM/ML", kAnnual}, {"LN2/ML", kAnnual}, {"LN3/ML", kAnnual},
+    {"SQE/ML", kAnnual}, {"GP2/ML", kPeaks},  {"WEI2/ML", kPeaks}, {"GAM/ML", kPeaks},
+    {"LN2/ML", kPeaks},  {"EXP1/ML", kPeaks}, {"TGUM/ML", kPeaks},
 };
 
 std::vector<double> EstimatedValues(const Distribution& d) {
@@ -74,6 +75,26 @@ std::optional<Distribution> With(const GeneralisedPareto& d, const std::vector<d
 }
 std::optional<Distribution> With(const Exponential& d, const std::vector<double>& p) {
     return Exponential::Make({d.Values().xi, p[0]}, LocationType::Fixed);
+}
+std::optional<Distribution> With(const Weibull& d, const std::vector<double>& p) {
+    return Weibull::Make({d.Values().xi, p[0], p[1]}, LocationType::Fixed);
+}
+std::optional<Distribution> With(const PearsonThree& d, const std::vector<double>& p) {
+    return PearsonThree::Make({d.Values().xi, p[0], p[1]}, LocationType::Fixed);
+}
+std::optional<Distribution> With(const LogNormal& d, const std::vector<double>& p) {
+    return p.size() == 3 ? LogNormal::Make({p[0], p[1], p[2]})
+                         : LogNormal::Make({d.Values().xi, p[0], p[1]}, LocationType::Fixed);
+}
+std::optional<Distribution> With(const SquareRootExponential&, const std::vector<double>& p) {
+    return SquareRootExponential::Make({p[0], p[1]});
+}
+std::optional<Distribution> With(const TruncatedGumbel& d, const std::vector<double>& p) {
+    return TruncatedGumbel::Make({p[0], p[1]}, d.Threshold());
+}
+template <class D>
+std::optional<Distribution> With(const D&, const std::vector<double>&) {
+    return std::nullopt; // no maximum likelihood
 }
 
 double LogLikelihood(const Distribution& d, const std::vector<double>& values) {
@@ -125,7 +146,7 @@ RC_GTEST_PROP(MaximumLikelihood, StandsOnASummitWithoutSlope, ()) {
             }
             const auto d = std::visit([&](const auto& family) { return With(family, moved); },
                                       fit->distribution);
-            return d ? LogLikelihood(*d, sample) : -INFINITY;
+            return d ? LogLikelihood(*d, sample) : -std::numeric_limits<double>::infinity();
         };
         const double slack = 1e-12 * (std::abs(fit->logLikelihood) + 100);
         for (int code = 0; code < 27; ++code) {
@@ -151,14 +172,7 @@ RC_GTEST_PROP(MaximumLikelihood, StandsOnASummitWithoutSlope, ()) {
     }
 }
 
-std::optional<double> Searched(const std::string& name, const std::vector<double>& sample) {
-    std::vector<double> exceedances;
-    for (const double x : sample) {
-        exceedances.push_back(x - kPeaks.threshold);
-    }
-    if (name == "GP2/ML") {
-        return testing::SearchPareto(exceedances);
-    }
+std::optional<double> SearchedGev(const std::vector<double>& sample) {
     FitScratch scratch;
     const auto start = EstimateParameters(Named("GEV/LMOM"), {sample, kAnnual}, scratch);
     if (!start) {
@@ -168,22 +182,87 @@ std::optional<double> Searched(const std::string& name, const std::vector<double
     return testing::SearchGev(sample, {p[0], p[1], p[2]});
 }
 
+std::optional<double> Searched(const std::string& name, const std::vector<double>& sample) {
+    auto exceedances = sample;
+    for (double& x : exceedances) {
+        x -= kPeaks.threshold;
+    }
+    if (name == "GEV/ML") {
+        return SearchedGev(sample);
+    }
+    if (name == "LN3/ML") {
+        return testing::SearchLogNormal(sample);
+    }
+    if (name == "SQE/ML") {
+        return testing::SearchSquareRootExponential(sample);
+    }
+    if (name == "GP2/ML") {
+        return testing::SearchPareto(exceedances);
+    }
+    return name == "TGUM/ML" ? testing::SearchTruncatedGumbel(exceedances) : std::nullopt;
+}
+
 // A search that ends outside the domain says nothing: the simplex is caught by the unbounded part
 // of the likelihood, or passes over it.
 RC_GTEST_PROP(MaximumLikelihood, IsNowhereBelowASearchByOtherMeans, ()) {
     const auto sample = AnySample();
     for (const Subject& subject : kSubjects) {
-        if (std::string(subject.name) == "GUM/ML") {
-            continue;
-        }
         const auto searched = Searched(subject.name, sample);
-        if (!searched) {
-            continue;
+        if (searched) {
+            const FitResult fit = Fit(Named(subject.name), {sample, subject.frame});
+            RC_ASSERT(static_cast<bool>(fit));
+            const double slack = 1e-9 * (100 + std::abs(*searched));
+            RC_ASSERT(!(fit->logLikelihood < *searched - slack));
         }
-        const FitResult fit = Fit(Named(subject.name), {sample, subject.frame});
-        RC_ASSERT(static_cast<bool>(fit));
-        const double slack = 1e-9 * (100 + std::abs(*searched));
-        RC_ASSERT(!(fit->logLikelihood < *searched - slack));
+    }
+}
+
+// mean(exp(-y/my)) = 0.5037 in rain40 and 0.53 in rain30.
+TEST(MaximumLikelihood, ReducesATruncatedGumbelWithAHeavyTailToTheExponential) {
+    for (const char* name : {"rain40", "rain30"}) {
+        const auto series = ReferenceSeries(name);
+        const SeriesFrame frame = FrameOf(name);
+        const FitResult gumbel = Fit(Named("TGUM/ML"), {series, frame});
+        const FitResult exponential = Fit(Named("EXP1/ML"), {series, frame});
+        ASSERT_TRUE(gumbel && exponential);
+        ASSERT_EQ(gumbel->warnings.size(), 1U);
+        EXPECT_EQ(WarningCode(gumbel->warnings[0]), "W3");
+        EXPECT_NEAR(gumbel->parameters[1].value, exponential->parameters[0].value, 1e-9);
+        for (const double e : {0.5, 0.1, 0.01, 1e-4}) {
+            const double expected = QuantileOfExceedance(exponential->distribution, e);
+            EXPECT_NEAR(QuantileOfExceedance(gumbel->distribution, e), expected, 1e-7 * expected);
+        }
+    }
+}
+
+// A failure for each reason, with its code.
+TEST(MaximumLikelihood, SaysWhyThereIsNoEstimate) {
+    const std::vector<double> equal(8, 21.5);
+    const std::vector<double> bounded = {20.1, 28, 29, 29.5, 29.8, 29.9, 29.95, 30};
+    const std::vector<double> leftSkewed = {21, 27, 28, 29, 29.5, 29.7, 29.8};
+    const std::vector<double> tied = {20, 20, 22, 23, 25, 21, 24, 26};
+    const std::vector<double> negative = {-1, 2, 3, 4, 5, 6};
+    const std::vector<double> withZero = {0, 2, 3, 4, 5, 6};
+    const std::vector<double> zeros(6, 0.0);
+    const struct {
+        const char* name;
+        const std::vector<double>& sample;
+        SeriesFrame frame;
+        const char* code;
+    } cases[] = {
+        {"GEV/ML", equal, kAnnual, "C11"},      {"GUM/ML", equal, kAnnual, "C11"},
+        {"LN2/ML", equal, kAnnual, "C11"},      {"LN3/ML", equal, kAnnual, "C11"},
+        {"WEI2/ML", equal, kPeaks, "C11"},      {"GAM/ML", equal, kPeaks, "C11"},
+        {"GP2/ML", bounded, kPeaks, "C11"},     {"LN3/ML", leftSkewed, kAnnual, "C11"},
+        {"GEV/ML", leftSkewed, kAnnual, "C11"}, {"WEI2/ML", tied, kPeaks, "C05"},
+        {"GAM/ML", tied, kPeaks, "C05"},        {"LN2/ML", tied, kPeaks, "C05"},
+        {"SQE/ML", negative, kAnnual, "C04"},   {"SQE/ML", zeros, kAnnual, "C04"},
+        {"LN2/ML", withZero, kAnnual, "C04"},   {"SQE/ML", withZero, kAnnual, ""},
+        {"GP2/ML", negative, kPeaks, "C15"},    {"TGUM/ML", negative, kPeaks, "C15"},
+    };
+    for (const auto& c : cases) {
+        const FitResult fit = Fit(Named(c.name), {c.sample, c.frame});
+        EXPECT_EQ(fit ? "" : FailureCode(fit.Failure()), c.code) << c.name << " " << c.sample[0];
     }
 }
 
