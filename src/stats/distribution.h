@@ -2,9 +2,16 @@
 
 #include "stats/exponential.h"
 #include "stats/family.h"
+#include "stats/frechet.h"
 #include "stats/generalised_pareto.h"
 #include "stats/gev.h"
 #include "stats/gumbel.h"
+#include "stats/log_normal.h"
+#include "stats/log_pearson_three.h"
+#include "stats/pearson_three.h"
+#include "stats/square_root_exponential.h"
+#include "stats/truncated_gumbel.h"
+#include "stats/weibull.h"
 
 #include <cstddef>
 #include <variant>
@@ -14,7 +21,9 @@ namespace ryn::stats {
 /// Any of the distributions, as a value. The functions of stats/family.h exist for it under the
 /// same names and with the same meaning; a loop over many values of one distribution does better to
 /// std::visit once and call them inside.
-using Distribution = std::variant<Gev, Gumbel, GeneralisedPareto, Exponential>;
+using Distribution =
+    std::variant<Gev, Gumbel, Weibull, Frechet, GeneralisedPareto, PearsonThree, LogPearsonThree,
+                 LogNormal, Exponential, SquareRootExponential, TruncatedGumbel>;
 
 Interval Support(const Distribution& d);
 double LogDensity(const Distribution& d, double x);

@@ -3,6 +3,7 @@
 #include "stats/exponential_estimators.h"
 #include "stats/generalised_pareto_estimators.h"
 #include "stats/gev_estimators.h"
+#include "stats/maximum_likelihood.h"
 
 #include <optional>
 
@@ -132,7 +133,7 @@ Outcome<Estimate> EstimateParameters(const Combination& combination, const FitIn
     case EstimationBasis::Values:
         break;
     }
-    return kNotAvailable;
+    return EstimateByLikelihood(combination, input, scratch);
 }
 
 Outcome<Estimate> EstimateFromMoments(const Combination& combination, const SeriesFrame& frame,

@@ -4,6 +4,7 @@
 #include "stats/distribution.h"
 #include "stats/fit_outcome.h"
 #include "stats/gumbel_estimators.h"
+#include "stats/likelihood_estimators.h"
 #include "stats/sample_statistics.h"
 
 #include <span>
@@ -32,6 +33,7 @@ struct Estimate {
 struct FitScratch {
     std::vector<double> sorted;
     GumbelConstants gumbel;
+    LikelihoodBuffer likelihood;
 };
 
 /// What an estimator needs to know of a sample. Moments and L-moments follow the deletion of a

@@ -103,7 +103,7 @@ double QuantileOfExceedance(const D& d, double exceedance) {
 /// u(x), the abscissa of the paper on which the fitted curve is a straight line (Takara and
 /// Takasao 1988), by the model's own formula and never through F. The formula goes on below an
 /// estimated lower bound where it is defined there; past a bound at which it diverges it is plus
-/// or minus infinity.
+/// or minus infinity. It rises with x, but for Pearson 3 and log-Pearson 3 with alpha < 0.
 template <Family D>
 double ReducedVariate(const D& d, double x) {
     return d.ReducedVariate(x);

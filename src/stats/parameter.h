@@ -35,4 +35,23 @@ struct LocationScaleShape {
     double kappa = 0; ///< shape, without unit; its sign and range are the family's
 };
 
+/// Values of a family with a known lower bound and one shape parameter.
+struct ScaleShape {
+    double alpha = 1; ///< scale; finite, > 0
+    double kappa = 1; ///< shape, without unit; finite, > 0
+};
+
+/// Values of the log-normal distribution.
+struct LowerBoundMeanDeviation {
+    double xi = 0;    ///< lower bound; finite
+    double mu = 0;    ///< mean of ln(x - xi); finite
+    double sigma = 1; ///< standard deviation of ln(x - xi); finite, > 0
+};
+
+/// Values of the square-root exponential distribution.
+struct SquareRootParameters {
+    double a = 1; ///< -ln of the probability of 0, without unit; finite, > 0
+    double b = 1; ///< in one over the unit of the series; finite, > 0
+};
+
 } // namespace ryn::stats

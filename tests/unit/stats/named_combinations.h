@@ -61,6 +61,9 @@ inline SeriesFrame FrameOf(const std::string& series) {
     if (series == "rain30") {
         return {SeriesKind::PartialDuration, 30, 152.0 / 48};
     }
+    if (series == "pp38") {
+        return {SeriesKind::PartialDuration, 3.8, 1};
+    }
     return {};
 }
 

@@ -85,7 +85,9 @@ TEST(MonteCarlo, ReproducesEveryDrawAndFit) {
     }
 }
 
-// An independent program; the L-moment fits confirmed with the R package lmom 3.2.
+// An independent program; the L-moment fits confirmed with the R package lmom 3.2. Its search for
+// the GEV's likelihood ended a little early: the hundred-year average, 4.6925694787, is that of
+// thirty digits throughout.
 TEST(Jackknife, MeetsAnIndependentProgram) {
     const Case cases[] = {
         {"portpirie",
@@ -96,6 +98,8 @@ TEST(Jackknife, MeetsAnIndependentProgram) {
          "GEV/LMOM",
          {4.306438, 4.590762, 4.701611},
          {0.05373043, 0.1041019, 0.1359985}},
+        {"portpirie", "GEV/ML", {4.301042, 4.582578, 4.692569}, {0.05212351, 0.1027011, 0.1348014}},
+        {"rain40", "GP2/ML", {66.64625, 87.0805, 95.94092}, {4.00934, 7.652107, 10.34916}},
         {"rain40", "EXP1/MOM", {66.461, 85.68281, 93.96119}, {4.074667, 7.034589, 8.309357}},
         {"rain40", "EXP1/ML", {66.461, 85.68281, 93.96119}, {4.074667, 7.034589, 8.309357}},
         {"rain40", "GP2/LMOM", {66.81543, 88.16572, 97.5302}, {4.135211, 10.10355, 14.44248}},
