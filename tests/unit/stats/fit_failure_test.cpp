@@ -52,18 +52,6 @@ TEST(Fit, RefusesWhatTheDistributionDoesNotOffer) {
     }
 }
 
-TEST(Fit, SaysWhatThisVersionDoesNotHave) {
-    const std::string text = " this combination is not available in this version";
-    const auto annual = ReferenceSeries("portpirie");
-    const auto peaks = ReferenceSeries("rain40");
-    for (const char* name : {"WEI/MOM", "FRE/MOM", "P3/LMOM", "LP3/MOM/LOG", "LN2/MOM"}) {
-        EXPECT_EQ(Failing(name, annual, kAnnual), text) << name;
-    }
-    for (const char* name : {"GAM/MOM", "LN2/LMOM"}) {
-        EXPECT_EQ(Failing(name, peaks, FrameOf("rain40")), text) << name;
-    }
-}
-
 TEST(Fit, NeedsFiveValues) {
     const std::string four = "C03 too few values: 4, at least 5 are needed";
     EXPECT_EQ(Failing("GEV/LMOM", {1, 2, 3, 5}, kAnnual), four);
