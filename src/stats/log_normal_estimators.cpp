@@ -77,7 +77,8 @@ double CorrectedSkewness(const CentralMoments& moments, LogNormalType correction
     const double g1 = moments.BiasedSkewness();
     const double constant = 1.01 + 7.01 / n + 14.66 / (n * n);
     const double slope = 1.69 / n + 74.66 / (n * n);
-    return g1 * (constant + slope * g1 * g1 * g1);
+    // The polynomial was fitted for positive skewness; far below 0 its cube would turn the sign.
+    return g1 * (constant + slope * std::max(0.0, g1 * g1 * g1));
 }
 
 bool IsCalibrated(std::size_t count, double correctedSkewness) {

@@ -219,6 +219,28 @@ TEST(ReducedVariate, GoesOnBelowAnEstimatedLowerBound) {
     EXPECT_EQ(StandardVariate(pareto, 9), -0.5);
 }
 
+// F(0) = exp(-a) belongs to the value 0 alone.
+TEST(SquareRootExponential, GivesZeroAProbabilityOfItsOwn) {
+    const auto d = SquareRootExponential::Make({2, 0.1}).value();
+    EXPECT_EQ(Cdf(d, 0), std::exp(-2));
+    EXPECT_EQ(Quantile(d, 0.13), 0);
+    EXPECT_EQ(QuantileOfExceedance(d, 0.87), 0);
+    const double above = Quantile(d, 0.136);
+    EXPECT_GT(above, 0);
+    EXPECT_NEAR(Cdf(d, above), 0.136, 1e-15);
+    EXPECT_EQ(Cdf(d, -1e-300), 0);
+}
+
+// Bounds in logarithms that no double can be.
+TEST(LogPearsonThree, HasBoundsBeyondTheDoubles) {
+    const Interval low = LogPearsonThree::Make({-2000, 5e-4, 4e6}).value().Support();
+    EXPECT_EQ(low.lower, 0);
+    EXPECT_FALSE(low.Contains(0));
+    const Interval high = LogPearsonThree::Make({2000, -5e-4, 4e6}).value().Support();
+    EXPECT_EQ(high.upper, kInfinity);
+    EXPECT_TRUE(high.Contains(1e308));
+}
+
 TEST(Parameters, TellWhichWereEstimated) {
     const auto fixed = GeneralisedPareto::Make({40, 11, -0.1}, LocationType::Fixed);
     const Distribution d = fixed.value();
