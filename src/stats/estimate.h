@@ -32,13 +32,15 @@ struct Estimate {
 /// sample size alone. Never shows in a result; one for each thread.
 struct FitScratch {
     std::vector<double> sorted;
+    std::vector<double> logarithms;
     GumbelConstants gumbel;
     LikelihoodBuffer likelihood;
 };
 
-/// What an estimator needs to know of a sample. Moments and L-moments follow the deletion of a
-/// value in closed form, so that the jackknife need not go through the sample again.
-enum class EstimationBasis { Moments, LMoments, Values };
+/// What an estimator needs to know of a sample. Moments and L-moments, of the values or of their
+/// natural logarithms, follow the deletion of a value in closed form, so that the jackknife need
+/// not go through the sample again.
+enum class EstimationBasis { Moments, LMoments, LogMoments, LogLMoments, Values };
 
 EstimationBasis BasisOf(const Combination& combination);
 
@@ -50,11 +52,13 @@ Outcome<Estimate> EstimateParameters(const Combination& combination, const FitIn
                                      FitScratch& scratch);
 
 /// The same from moments that the caller has, as when a value is deleted from the sums in closed
-/// form. Fails as MethodNotOffered for a combination with another basis.
+/// form: those of the values or of their logarithms, as the basis says. Whether all values are
+/// positive where they must be, the caller knows. Fails as MethodNotOffered for a combination with
+/// another basis.
 Outcome<Estimate> EstimateFromMoments(const Combination& combination, const SeriesFrame& frame,
                                       const CentralMoments& moments, FitScratch& scratch);
 
-/// The same from L-moments.
+/// The same from L-moments, likewise.
 Outcome<Estimate> EstimateFromLMoments(const Combination& combination, const SeriesFrame& frame,
                                        const LMoments& moments);
 

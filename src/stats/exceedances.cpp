@@ -7,6 +7,7 @@ namespace ryn::stats {
 
 Outcome<Exceedances> ExceedancesOf(std::span<const double> values, double threshold,
                                    ZeroExceedances zeros, std::vector<double>& buffer) {
+    // One comparison decides what stays: every exceedance, or every positive one.
     const double least = zeros == ZeroExceedances::Kept ? -1.0 : 0.0;
     buffer.clear();
     double sum = 0;
@@ -20,6 +21,7 @@ Outcome<Exceedances> ExceedancesOf(std::span<const double> values, double thresh
         }
     }
     const double mean = sum / static_cast<double>(buffer.size());
+    // Before the sign of the sum, since a NaN is not positive either.
     if (!std::isfinite(sum)) {
         return FitFailure{FitFault::InvalidParameters};
     }
@@ -29,6 +31,7 @@ Outcome<Exceedances> ExceedancesOf(std::span<const double> values, double thresh
     if (10 * buffer.size() < 9 * values.size()) {
         return FitFailure{FitFault::ValuesAtThreshold};
     }
+    // Divided at the end: the unit is the mean of what stays, so that the mean of the result is 1.
     for (double& y : buffer) {
         y /= mean;
     }

@@ -120,6 +120,7 @@ Outcome<GeneralisedPareto> MostLikelyParetoAbove(double threshold, std::span<con
     if (!exceedances) {
         return exceedances.Failure();
     }
+    // The bound of theta then is 1, whatever the sample.
     for (double& y : buffer) {
         y /= exceedances->largest;
     }

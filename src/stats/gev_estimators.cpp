@@ -5,20 +5,8 @@
 #include "stats/shape_functions.h"
 
 #include <cmath>
-#include <numbers>
 
 namespace ryn::stats {
-
-namespace {
-
-// Hosking, Wallis and Wood's approximation; its error in kappa is below 9e-4 for L-skewness
-// between -0.5 and 0.5.
-double ApproximateShape(double lSkewness) {
-    const double c = 2 / (3 + lSkewness) - std::numbers::ln2 / std::log(3.0);
-    return (7.8590 + 2.9554 * c) * c;
-}
-
-} // namespace
 
 // A GEV has mean xi + alpha B(kappa), variance alpha^2 A(kappa) and skewness SK(kappa): the
 // skewness gives kappa, then the variance alpha, then the mean xi.
@@ -50,7 +38,7 @@ Outcome<Gev> GevFromLMoments(const LMoments& moments) {
         return outside;
     }
     const auto excess = [t3](double kappa) { return GevLSkewness(kappa) - t3; };
-    const auto kappa = RootNear(excess, {-0.999999, 50}, ApproximateShape(t3), 1e-3);
+    const auto kappa = RootNear(excess, {-0.999999, 50}, GevShapeNear(t3), 1e-3);
     if (!kappa) {
         return outside;
     }

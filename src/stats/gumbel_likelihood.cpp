@@ -73,6 +73,7 @@ Outcome<Gumbel> MostLikelyGumbel(std::span<const double> values, LikelihoodBuffe
     for (const double x : values) {
         buffer.push_back((x - smallest) / unit);
     }
+    // The deviation of a Gumbel variable is pi/sqrt 6 of its scale.
     const double start = std::max(0.0, std::log(1.2825 / RootMeanSquare(buffer)));
     const auto peak =
         MaximumBetween([&](double logBeta) { return ProfileAt(buffer, logBeta); }, {0, 50}, start);

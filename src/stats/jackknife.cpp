@@ -20,6 +20,16 @@ std::vector<double> Sorted(const FitInput& input) {
     return sorted;
 }
 
+// Ascending like the values. Those that have none have no fit either.
+std::vector<double> Logarithms(std::span<const double> sorted) {
+    std::vector<double> logs;
+    logs.reserve(sorted.size());
+    for (const double x : sorted) {
+        logs.push_back(std::log(x));
+    }
+    return logs;
+}
+
 // Equal values leave equal samples behind: one fit stands for all of them.
 template <class EstimateWithout>
 void AddDeletions(std::span<const double> sorted, const SeriesFrame& frame, QuantileTally& tally,
@@ -36,19 +46,27 @@ void AddDeletions(std::span<const double> sorted, const SeriesFrame& frame, Quan
 void AddDeletions(const Combination& combination, std::span<const double> sorted,
                   const SeriesFrame& frame, QuantileTally& tally) {
     FitScratch scratch;
-    switch (BasisOf(combination)) {
-    case EstimationBasis::Moments: {
-        const MomentDeletions deletions(sorted);
-        return AddDeletions(sorted, frame, tally, [&](std::size_t i) {
+    const auto fromMoments = [&](std::span<const double> ascending) {
+        const MomentDeletions deletions(ascending);
+        AddDeletions(sorted, frame, tally, [&](std::size_t i) {
             return EstimateFromMoments(combination, frame, deletions.Without(i), scratch);
         });
-    }
-    case EstimationBasis::LMoments: {
-        const LMomentDeletions deletions(sorted);
-        return AddDeletions(sorted, frame, tally, [&](std::size_t i) {
+    };
+    const auto fromLMoments = [&](std::span<const double> ascending) {
+        const LMomentDeletions deletions(ascending);
+        AddDeletions(sorted, frame, tally, [&](std::size_t i) {
             return EstimateFromLMoments(combination, frame, deletions.Without(i));
         });
-    }
+    };
+    switch (BasisOf(combination)) {
+    case EstimationBasis::Moments:
+        return fromMoments(sorted);
+    case EstimationBasis::LMoments:
+        return fromLMoments(sorted);
+    case EstimationBasis::LogMoments:
+        return fromMoments(Logarithms(sorted));
+    case EstimationBasis::LogLMoments:
+        return fromLMoments(Logarithms(sorted));
     case EstimationBasis::Values:
         break;
     }

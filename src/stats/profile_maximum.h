@@ -31,10 +31,10 @@ struct Peak {
 
 /// The maximum of `profile` inside `bracket`, at whose lower end it rises and at whose upper end it
 /// falls, by Newton's method on the slope. A step that leaves the bracket, goes down or does not
-/// halve the one before gives way to a bisection, so that the bracket always closes. Unknowns
+/// halve the one before gives way to a bisection, so that the bracket always closes. The unknown
 /// must be free of units and of the order of 1: the end is a step below 1e-9, which is still taken
-/// and leaves an error near 1e-18 of it squared. Nothing when the slope is NaN on the way or after
-/// 100 evaluations.
+/// and leaves an error of the order of its square. Nothing when the slope is NaN on the way, or
+/// after 100 evaluations.
 template <class F>
 std::optional<Peak> MaximumBetween(F&& profile, Bracket bracket, double start) {
     double place = start;

@@ -1,6 +1,7 @@
 #include "stats/shape_functions.h"
 
-#include <boost/math/policies/policy.hpp>
+#include "stats/quiet_policy.h"
+
 #include <boost/math/special_functions/gamma.hpp>
 
 #include <array>
@@ -41,10 +42,7 @@ double Series(const Coefficients& coefficients, double kappa) {
 
 // Gamma(1 + x) - 1 without the loss of the leading 1; poles and overflow give NaN or infinity.
 double GammaMinusOne(double x) {
-    using namespace boost::math::policies;
-    using Quiet = policy<promote_double<false>, domain_error<ignore_error>,
-                         pole_error<ignore_error>, overflow_error<ignore_error>>;
-    return boost::math::tgamma1pm1(x, Quiet());
+    return boost::math::tgamma1pm1(x, QuietPolicy());
 }
 
 // Gamma(1 + 2k) - Gamma(1 + k)^2 with both written as 1 + something small.
@@ -114,9 +112,26 @@ double GevLSkewness(double kappa) {
     return 2 * std::expm1(-kappa * std::log(3.0)) / std::expm1(-kappa * std::numbers::ln2) - 3;
 }
 
+// Hosking, Wallis and Wood's approximation.
+double GevShapeNear(double lSkewness) {
+    const double c = 2 / (3 + lSkewness) - std::numbers::ln2 / std::log(3.0);
+    return (7.8590 + 2.9554 * c) * c;
+}
+
 double GevLScaleFactor(double kappa) {
     return IsExponentialLimit(kappa) ? std::numbers::ln2
                                      : -std::expm1(-kappa * std::numbers::ln2) / kappa;
+}
+
+// Around 0 through the variance factor, in which the leading ones have cancelled; Gamma itself
+// overflows far above and has a pole near -1/2, where its logarithm does not care.
+double LogPowerSpread(double h) {
+    if (std::abs(h) > 0.25) {
+        return boost::math::lgamma(1 + 2 * h, QuietPolicy()) -
+               2 * boost::math::lgamma(1 + h, QuietPolicy());
+    }
+    const double mean = std::tgamma(1 + h);
+    return std::log1p(h * h * GevVarianceFactor(h) / (mean * mean));
 }
 
 } // namespace ryn::stats

@@ -34,8 +34,17 @@ double GevSkewness(double kappa);
 /// decreasing from 1 to -1; 2 ln 3/ln 2 - 3 at 0.
 double GevLSkewness(double kappa);
 
+/// A kappa with about that L-skewness, from which to solve for it (Hosking et al. 1985); the error
+/// is below 9e-4 for L-skewness between -0.5 and 0.5.
+double GevShapeNear(double lSkewness);
+
 /// (1 - 2^-kappa)/kappa, and ln 2 at 0: the second L-moment of a GEV with alpha = 1 over
 /// Gamma(1 + kappa).
 double GevLScaleFactor(double kappa);
+
+/// ln(1 + v) with v the squared coefficient of variation of the h-th power of a standard
+/// exponential variable, ln Gamma(1 + 2h) - 2 ln Gamma(1 + h), h > -1/2: that of a Weibull variable
+/// for h > 0, of a Frechet variable for h < 0. Accurate around h = 0, where it vanishes.
+double LogPowerSpread(double h);
 
 } // namespace ryn::stats

@@ -50,22 +50,29 @@ ProfilePoint ProfileAt(const Means& means, double t) {
             -means.r / 4 + (means.third / means.first + share * share) / 4};
 }
 
-} // namespace
-
-Outcome<SquareRootExponential> MostLikelySquareRootExponential(std::span<const double> values,
-                                                               LikelihoodBuffer& buffer) {
+// Etoh, Murota and Nakanishi's likelihood asks for no mean; it is the unit that makes b free of
+// one.
+double MeanOf(std::span<const double> values) {
     double sum = 0;
     for (const double x : values) {
         sum += x;
     }
+    return sum / static_cast<double>(values.size());
+}
+
+} // namespace
+
+Outcome<SquareRootExponential> MostLikelySquareRootExponential(std::span<const double> values,
+                                                               LikelihoodBuffer& buffer) {
+    const double mean = MeanOf(values);
     const double smallest = *std::min_element(values.begin(), values.end());
-    if (!std::isfinite(sum)) {
+    if (!std::isfinite(mean)) {
         return FitFailure{FitFault::InvalidParameters};
     }
-    if (smallest < 0 || !(sum > 0)) {
+    if (smallest < 0 || !(mean > 0)) {
         return FitFailure{FitFault::ValuesNotPositive};
     }
-    const double mean = sum / static_cast<double>(values.size());
+    // The roots are taken once; a step in b only scales them.
     buffer.clear();
     for (const double x : values) {
         buffer.push_back(std::sqrt(x / mean));
@@ -76,6 +83,7 @@ Outcome<SquareRootExponential> MostLikelySquareRootExponential(std::span<const d
     PeakSearch search;
     search.Walk([&](double t) { return ProfileAt(meansAt(t), t); }, std::log(1e-3), std::log(1e5),
                 12);
+    // Narrow samples far from 0 rise on and on with b.
     if (!search.Highest() || search.Highest()->value < search.HighestEnd()) {
         return FitFailure{FitFault::NoInteriorMaximum};
     }

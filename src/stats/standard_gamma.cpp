@@ -120,8 +120,4 @@ double StandardGamma::Solve(Tail tail, double probability) const {
     return z;
 }
 
-double HalfStepGammaRatio(double k) {
-    return boost::math::tgamma_delta_ratio(k, 0.5, QuietPolicy());
-}
-
 } // namespace ryn::stats

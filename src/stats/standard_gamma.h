@@ -35,7 +35,4 @@ class StandardGamma {
     double offset; ///< the part of LogKernel that does not depend on z
 };
 
-/// Gamma(k)/Gamma(k + 1/2), k > 0.
-double HalfStepGammaRatio(double k);
-
 } // namespace ryn::stats

@@ -67,6 +67,7 @@ Outcome<Weibull> MostLikelyWeibullAbove(double threshold, std::span<const double
     if (!exceedances) {
         return exceedances.Failure();
     }
+    // Shares of the largest: no power of them overflows, whatever the shape.
     for (double& y : buffer) {
         y = std::log(y / exceedances->largest);
     }
@@ -81,6 +82,7 @@ Outcome<Weibull> MostLikelyWeibullAbove(double threshold, std::span<const double
     }
     const double k = std::exp(peak->place);
     const auto n = static_cast<double>(buffer.size());
+    // The power mean through its logarithm, since for large k all but the largest value vanish.
     const double alpha = std::exp(std::log(SumsAt(buffer, k).weight / n) / k);
     return Checked(Weibull::Make({threshold, exceedances->mean * exceedances->largest * alpha, k},
                                  LocationType::Fixed));

@@ -5,7 +5,12 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <functional>
 #include <limits>
+#include <map>
+#include <string>
+#include <variant>
+#include <vector>
 
 namespace ryn::stats {
 namespace {
@@ -15,6 +20,7 @@ using testing::ReferenceNumber;
 using testing::ReferenceTable;
 
 constexpr double kInfinity = std::numeric_limits<double>::infinity();
+constexpr double kEpsilon = std::numeric_limits<double>::epsilon();
 
 struct Spot {
     double value;
@@ -39,6 +45,110 @@ TEST(GeneralisedPareto, TakesPublishedValues) {
     ExpectSpots({{Quantile(d, 0.99), 99.34376800},
                  {Cdf(d, 60), 0.8159208541},
                  {LogDensity(d, 60), -4.210408474}});
+}
+
+TEST(OtherFamilies, TakePublishedValues) {
+    const PearsonThree right = PearsonThree::Make({1, 2, 3}).value();
+    const PearsonThree left = PearsonThree::Make({1, -2, 3}).value();
+    const Weibull weibull = Weibull::Make({40, 11.7, 0.958}).value();
+    const Frechet frechet = Frechet::Make({2000, 2.9}).value();
+    const LogPearsonThree logPearson = LogPearsonThree::Make({6.2, 0.2, 7.5}).value();
+    const LogNormal logNormal = LogNormal::Make({30, 2.5, 0.7}).value();
+    const SquareRootExponential rain = SquareRootExponential::Make({72, 13.27}).value();
+    const TruncatedGumbel peaks = TruncatedGumbel::Make({3.935, 0.1712}, 3.8).value();
+    ExpectSpots({
+        {Quantile(right, 0.99), 17.81189383},
+        {Cdf(right, 10), 0.8264219291},
+        {LogDensity(right, 10), -2.878139568},
+        {Quantile(left, 0.99), 0.1279096698},
+        {Cdf(left, -5), 0.4231900811},
+        {Quantile(weibull, 0.99), 97.61149207},
+        {Cdf(weibull, 60), 0.8120049247},
+        {LogDensity(weibull, 60), -4.196353878},
+        {Quantile(frechet, 0.99), 9770.870239},
+        {Cdf(frechet, 3000), 0.7345061127},
+        {LogDensity(frechet, 3000), -8.426062605},
+        {Quantile(logPearson, 0.99), 10485.94866},
+        {Cdf(logPearson, 3000), 0.7406672594},
+        {LogDensity(logPearson, 3000), -8.658218559},
+        {Quantile(logNormal, 0.99), 92.08121901},
+        {Cdf(logNormal, 50), 0.7605860402},
+        {LogDensity(logNormal, 50), -3.808761666},
+        {Quantile(rain, 0.99), 9.783264948},
+        {Cdf(rain, 5), 0.8261539580},
+        {LogDensity(rain, 5), -2.167500279},
+        {Quantile(peaks, 0.99), 4.742741869},
+        {Cdf(peaks, 4.2), 0.7845334184},
+        {LogDensity(peaks, 4.2), 0.1217417296},
+    });
+    EXPECT_NEAR(Cdf(rain, 0), 5.380186e-32, 5e-39);
+}
+
+Distribution Member(const std::vector<std::string>& row) {
+    const double a = ReferenceNumber(row[1]);
+    const double b = ReferenceNumber(row[2]);
+    const double c = ReferenceNumber(row[3]);
+    const std::map<std::string, std::function<Distribution()>> makers = {
+        {"WEI",
+         [=] {
+             return Weibull::Make({a, b, c}).value();
+         }},
+        {"FRE",
+         [=] {
+             return Frechet::Make({a, b}).value();
+         }},
+        {"P3",
+         [=] {
+             return PearsonThree::Make({a, b, c}).value();
+         }},
+        {"LP3",
+         [=] {
+             return LogPearsonThree::Make({a, b, c}).value();
+         }},
+        {"LN3",
+         [=] {
+             return LogNormal::Make({a, b, c}).value();
+         }},
+        {"SQE",
+         [=] {
+             return SquareRootExponential::Make({a, b}).value();
+         }},
+        {"TGUM",
+         [=] {
+             return TruncatedGumbel::Make({a, b}, c).value();
+         }},
+    };
+    return makers.at(row[0])();
+}
+
+// The level whose rounding moves a quantile: that of the location, or of its logarithm.
+double RoundingLevel(const Distribution& d, double x) {
+    const bool isLogarithmic =
+        std::holds_alternative<LogPearsonThree>(d) || std::holds_alternative<LogNormal>(d);
+    double sum = 0;
+    for (const Parameter& parameter : Parameters(d)) {
+        sum += std::abs(parameter.symbol == "kappa" ? 1 : parameter.value);
+    }
+    return isLogarithmic ? std::abs(x) * sum : std::abs(x) + sum;
+}
+
+// 50 digits, from the definitions; probabilities down to 1e-12, shapes from 0.05 to 4e6.
+TEST(TailsOfOtherFamilies, AgreeWithHighPrecision) {
+    const auto rows = ReferenceTable("families.csv");
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row[0] + " " + row[1] + " " + row[2] + " " + row[3] + " at " + row[4]);
+        const Distribution d = Member(row);
+        const double p = ReferenceNumber(row[4]);
+        const double upper = ReferenceNumber(row[5]);
+        const double lower = ReferenceNumber(row[6]);
+        EXPECT_NEAR(QuantileOfExceedance(d, p), upper, 2e-14 * RoundingLevel(d, upper));
+        EXPECT_NEAR(Quantile(d, p), lower, 2e-14 * RoundingLevel(d, lower));
+        const double density = ReferenceNumber(row[7]);
+        const double step = 4 * kEpsilon * RoundingLevel(d, upper);
+        const double slack = std::abs(LogDensity(d, upper + step) - LogDensity(d, upper));
+        EXPECT_NEAR(LogDensity(d, upper), density, slack + 2e-14 * (1 + std::abs(density)));
+    }
+    EXPECT_EQ(rows.size(), 155U);
 }
 
 // False where x has too few digits left to compare densities: within 1e-3 of a bound's pole.
@@ -107,6 +217,28 @@ TEST(ReducedVariate, GoesOnBelowAnEstimatedLowerBound) {
     EXPECT_EQ(ReducedVariate(Exponential::Make({10, 2}).value(), 9), -0.5);
     EXPECT_EQ(ReducedVariate(pareto, 14), kInfinity);
     EXPECT_EQ(StandardVariate(pareto, 9), -0.5);
+}
+
+// F(0) = exp(-a) belongs to the value 0 alone.
+TEST(SquareRootExponential, GivesZeroAProbabilityOfItsOwn) {
+    const auto d = SquareRootExponential::Make({2, 0.1}).value();
+    EXPECT_EQ(Cdf(d, 0), std::exp(-2));
+    EXPECT_EQ(Quantile(d, 0.13), 0);
+    EXPECT_EQ(QuantileOfExceedance(d, 0.87), 0);
+    const double above = Quantile(d, 0.136);
+    EXPECT_GT(above, 0);
+    EXPECT_NEAR(Cdf(d, above), 0.136, 1e-15);
+    EXPECT_EQ(Cdf(d, -1e-300), 0);
+}
+
+// Bounds in logarithms that no double can be.
+TEST(LogPearsonThree, HasBoundsBeyondTheDoubles) {
+    const Interval low = LogPearsonThree::Make({-2000, 5e-4, 4e6}).value().Support();
+    EXPECT_EQ(low.lower, 0);
+    EXPECT_FALSE(low.Contains(0));
+    const Interval high = LogPearsonThree::Make({2000, -5e-4, 4e6}).value().Support();
+    EXPECT_EQ(high.upper, kInfinity);
+    EXPECT_TRUE(high.Contains(1e308));
 }
 
 TEST(Parameters, TellWhichWereEstimated) {

@@ -11,7 +11,7 @@
 
 namespace ryn::stats::testing {
 
-/// The combination that results show under `name`, as "GP2/LMOM".
+/// The combination that results show under `name`, as "GP2/LMOM" or "LN3/MOM/BI".
 inline Combination Named(const std::string& name) {
     struct Code {
         DistributionType distribution;
@@ -50,6 +50,17 @@ inline Combination Named(const std::string& name) {
     combination.location = code.location;
     combination.method = methods.at(name.substr(slash + 1, end - slash - 1));
     combination.sampleCorrection = name.ends_with(" corr");
+    combination.logPearson =
+        name.ends_with("/REAL") ? LogPearsonType::RealSpace : LogPearsonType::LogSpace;
+    static const std::map<std::string, LogNormalType> bounds = {
+        {"BI", LogNormalType::SkewnessCorrectionI},
+        {"BII", LogNormalType::SkewnessCorrectionII},
+        {"LBQI", LogNormalType::LowerBoundQuantileI},
+        {"LBQII", LogNormalType::LowerBoundQuantileII}};
+    const auto bound = bounds.find(name.substr(name.rfind('/') + 1));
+    if (bound != bounds.end()) {
+        combination.logNormal = bound->second;
+    }
     return combination;
 }
 
