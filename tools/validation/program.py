@@ -2,7 +2,6 @@
 
 import csv
 import json
-import math
 import os
 import re
 import struct
@@ -92,24 +91,31 @@ class Program:
         answer = self._run("fit", name, series.path, *options, check=False).stdout
         return fit_of(name, series, json.loads(answer))
 
-    def _fit_corrected(self, series):
-        """Gumbel's constants of the sample size are an option of an analysis, not of a name, and its
-        results are events alone; a Gumbel fit is linear in two of them."""
+    def analysis(self, values, *settings):
+        """The results of a whole analysis of annual maxima with GUM/MOM, as `info` tells them. A data
+        file holds 32-bit numbers, so that the values lose digits beyond the seventh."""
         with tempfile.TemporaryDirectory() as folder:
             at = lambda name: os.path.join(folder, name)
             with open(at("table.csv"), "w", encoding="utf-8") as table:
                 table.write("date,value\n")
-                for i, value in enumerate(series.values):
+                for i, value in enumerate(values):
                     table.write(f"{1801 + i}-01-01,{value!r}\n")
             self._run("import", at("table.csv"), at("series.tsq0"))
             self._run("new", at("case.ryn"), "DefineEVS.InputFileName=" + at("series.tsq0"),
-                      "DefineEVS.OutputFileName=" + at("case.res"), "--fit", "GUM/MOM",
-                      "ProbabilityDistribution.Item1.SampleCorrection=true", "--periods", "2,100")
-            answer = json.loads(self._run("run", at("case.RYN"), "--json").stdout)
-        two, hundred = (q["estimate"] for q in answer["combinations"][0]["quantiles"])
-        variate = lambda period: -math.log(-math.log1p(-1 / period))
-        alpha = (hundred - two) / (variate(100) - variate(2))
-        return Fit(CORRECTED, series, [("xi", two - alpha * variate(2)), ("alpha", alpha)], hundred)
+                      "DefineEVS.OutputFileName=" + at("case.res"), "--fit", "GUM/MOM", *settings,
+                      "--periods", "100")
+            self._run("run", at("case.RYN"))
+            return json.loads(self._run("info", at("case.res"), "--json").stdout)["RYNoutput"]
+
+    def _fit_corrected(self, series):
+        """Gumbel's constants of the sample size are an option of an analysis, not of a name."""
+        results = self.analysis(series.values, "ProbabilityDistribution.Item1.SampleCorrection=true",
+                                "Analysis.LogLikelihood=true")
+        item = results["DistributionAnalysis"]["Item1"]
+        parameters = [(item["ParameterEstimates"][f"strParEst{i}"],
+                       item["ParameterEstimates"][f"ParEst{i}"]) for i in (1, 2)]
+        return Fit(CORRECTED, series, parameters, item["TyearEventTable"]["TyearEvent"],
+                   item["GoodnessOfFitStatistics"]["LogLikelihoodStatistic"])
 
 
 def fit_of(name, series, answer):

@@ -63,11 +63,33 @@ def _lines(heading, rows):
     return "\n".join("| " + " | ".join(row) + " |" for row in cells)
 
 
-def fits_table(comparisons):
-    """One row for each name and peer, parted by the kind of series."""
+def _series_table(series):
+    rows = [[s.name, KINDS[s.kind], str(len(s.values)), s.caption, s.source,
+             "" if s.threshold is None else f"{s.threshold:g}, {len(s.values)}/{s.years:g}"]
+            for s in series]
+    return _lines(["series", "kind", "n", "what", "source", "threshold, peaks a year"], rows)
+
+
+def _count(comparisons):
+    made = [c for c in comparisons if not c.fit.failed]
+    equations = [c for c in made if not c.is_likelihood]
+    likelihoods = [c for c in made if c.is_likelihood]
+    names = {(c.fit.series.kind, c.fit.name) for c in made}
+    worst = max(c.difference for c in equations)
+    base = max(c.difference for c in likelihoods if c.peer.startswith("base R"))
+    package = max(c.difference for c in likelihoods if not c.peer.startswith("base R"))
+    gains = [c.gain for c in likelihoods if not math.isnan(c.gain)]
+    return (f"{len(names)} names, {len(made)} comparisons. Largest relative difference of fits by moments "
+            f"and L-moments {small(worst)}, by maximum likelihood {small(base)} to base R and "
+            f"{small(package)} to the packages, whose likelihoods the program's exceed by "
+            f"{small(min(gains))} to {small(max(gains))}.")
+
+
+def fits_table(comparisons, series):
+    """The series, a summary, and one row for each name and peer, parted by the kind of series."""
     heading = ["name", "series", "n", "parameters", "100-year event", "ln L", "compared with",
                "difference", "ln L against it", "largest difference on all series"]
-    parts = []
+    parts = [_series_table(series), _count(comparisons)]
     for kind, caption in KINDS.items():
         rows = []
         names = []
@@ -77,6 +99,41 @@ def fits_table(comparisons):
                 rows.append(_row(group, len(names)))
         parts.append(f"**{caption.capitalize()}**\n\n" + _lines(heading, rows))
     return "\n\n".join(parts)
+
+
+def _refused_or(fit, text):
+    return f"refused: {fit.failed}" if fit.failed else text
+
+
+def _signed(gain):
+    return "" if math.isnan(gain) else f"{gain:+.4f}"
+
+
+def published_table(rows):
+    """One row for each series: the likelihoods against the table's, which have three decimals."""
+    heading = ["series", "n", "source", "l1, l2, t3, t4", "GEV/ML kappa", "ln L", "less published",
+               "GUM/ML ln L", "less published"]
+    lines = []
+    for r in sorted(rows, key=lambda r: r.caption.lower()):
+        l = ", ".join(six(r.statistics[key]) for key in ("l1", "l2", "t3", "t4"))
+        gev_gain, gumbel_gain = (_signed(gain) for gain in r.gains())
+        kappa = _refused_or(r.gev, "" if r.gev.failed else six(r.gev.parameters[2][1]))
+        lines.append([r.caption, str(len(r.values)), r.source, l, kappa, six(r.gev.log_likelihood),
+                      gev_gain, six(r.gumbel.log_likelihood), gumbel_gain])
+    return _lines(heading, lines) + "\n\n" + _published_summary(rows)
+
+
+def _published_summary(rows):
+    gains = [gain for r in rows for gain in r.gains() if not math.isnan(gain)]
+    worst = max((r for r in rows if not r.gev.failed), key=lambda r: r.parameter_difference())
+    refused = [f"{r.caption} ({r.gev.failed})" for r in rows if r.gev.failed]
+    text = (f"{len(rows)} series, {len(gains)} likelihoods: the program's less the published one lies "
+            f"between {min(gains):+.4f} and {max(gains):+.4f}, where the published ones are rounded to "
+            "0.001. Mean, standard deviation, skewness and L-moments differ by at most "
+            f"{max(r.statistics_difference() for r in rows):.2f} units of the last digit given. "
+            "Largest difference of a location or scale (relative) or of the shape: "
+            f"{worst.parameter_difference():.0e} ({worst.caption}).")
+    return text + (" Refused by the program: GEV/ML of " + ", ".join(refused) + "." if refused else "")
 
 
 def write_csv(path, comparisons):

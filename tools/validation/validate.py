@@ -2,9 +2,11 @@
 """Holds every fit the program offers against fits made in R, on real series.
 
     tools/validation/validate.py RYN [--out FILE.csv] [--docs docs/methods.md]
+                                    [--published DIRECTORY]
 
 Prints the table of docs/methods.md and, with --docs, puts it there between its two marks; --out takes
-every number of every fit. The exit code is 1 when a difference is larger than demanded.
+every number of every fit. A directory with reference_fits.csv, a collection of series with published
+fits (published.py tells its form), gives a second table. The exit code is 1 when a difference is larger than demanded.
 """
 
 import argparse
@@ -13,6 +15,7 @@ import sys
 
 import comparison
 import program
+import published
 import tables
 
 HERE = os.path.dirname(os.path.abspath(__file__))
@@ -36,23 +39,42 @@ def arguments():
     parser.add_argument("ryn")
     parser.add_argument("--out")
     parser.add_argument("--docs")
+    parser.add_argument("--published")
     return parser.parse_args()
+
+
+def show(options, mark, text):
+    print(text + "\n")
+    if options.docs:
+        tables.put_between_marks(options.docs, mark, text)
+
+
+def validate_fits(options, ryn):
+    """Against R; the faults."""
+    series = program.read_series(os.path.join(HERE, "series.csv"), SERIES)
+    comparisons = comparison.compare(all_fits(ryn, series))
+    show(options, "validation table", tables.fits_table(comparisons, series))
+    if options.out:
+        os.makedirs(os.path.dirname(os.path.abspath(options.out)), exist_ok=True)
+        tables.write_csv(options.out, comparisons)
+    return [f"{c.fit.name} {c.fit.series.name}: {c.fault()}" for c in comparisons if c.fault()]
+
+
+def validate_published(options, ryn):
+    """Against a collection's published fits; the faults."""
+    rows = published.read(ryn, options.published)
+    show(options, "published fits", tables.published_table(rows))
+    return [f"{r.caption}: {r.fault()}" for r in rows if r.fault()]
 
 
 def main():
     options = arguments()
-    series = program.read_series(os.path.join(HERE, "series.csv"), SERIES)
-    comparisons = comparison.compare(all_fits(program.Program(options.ryn), series))
-    text = tables.fits_table(comparisons)
-    print(text)
-    if options.out:
-        os.makedirs(os.path.dirname(os.path.abspath(options.out)), exist_ok=True)
-        tables.write_csv(options.out, comparisons)
-    if options.docs:
-        tables.put_between_marks(options.docs, "validation table", text)
-    faults = [c for c in comparisons if c.fault()]
-    for c in faults:
-        print(f"{c.fit.name} {c.fit.series.name}: {c.fault()}", file=sys.stderr)
+    ryn = program.Program(options.ryn)
+    faults = validate_fits(options, ryn)
+    if options.published:
+        faults += validate_published(options, ryn)
+    for fault in faults:
+        print(fault, file=sys.stderr)
     return 1 if faults else 0
 
 
