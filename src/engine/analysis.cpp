@@ -29,8 +29,11 @@ void MakeFiniteOrNaN(std::vector<double>& values) {
 
 void MakeFiniteOrNaN(std::vector<ResampledQuantile>& quantiles) {
     for (ResampledQuantile& quantile : quantiles)
-        quantile = {FiniteOrNaN(quantile.estimate), FiniteOrNaN(quantile.average),
-                    FiniteOrNaN(quantile.standardDeviation), FiniteOrNaN(quantile.bias)};
+        for (double ResampledQuantile::*const member :
+             {&ResampledQuantile::estimate, &ResampledQuantile::average,
+              &ResampledQuantile::standardDeviation, &ResampledQuantile::bias,
+              &ResampledQuantile::lower, &ResampledQuantile::upper})
+            quantile.*member = FiniteOrNaN(quantile.*member);
 }
 
 // In time order: all but the last depend on it.
@@ -78,6 +81,11 @@ ResampledQuantiles EstimatesAlone(const stats::Distribution& fitted, const Serie
     return quantiles;
 }
 
+// Sorted once for all combinations.
+stats::FitInput Ascending(const EngineInput& input, const SeriesResults& series) {
+    return {series.ascending, input.frame, stats::ValueOrder::Ascending};
+}
+
 // In one pass for table and curves: the resamples are the same, and refitting them is nearly all of
 // the time.
 ResampledQuantiles Quantiles(const EngineInput& input, const SeriesResults& series,
@@ -89,7 +97,7 @@ ResampledQuantiles Quantiles(const EngineInput& input, const SeriesResults& seri
     case UncertaintyMethod::MonteCarlo:
         return stats::MonteCarlo({combination, fitted, input.values.size(), input.frame}, requests);
     case UncertaintyMethod::Jackknife:
-        return stats::Jackknife(combination, fitted, {input.values, input.frame}, requests);
+        return stats::Jackknife(combination, fitted, Ascending(input, series), requests);
     case UncertaintyMethod::None:
         break;
     }
@@ -172,7 +180,7 @@ CombinationAnalysis AnalyseCombination(const EngineInput& input, const SeriesRes
     const stats::Combination& asked = combination.combination;
     CombinationAnalysis analysis{{combination.name,
                                   stats::EstimatedSymbols(asked, input.frame.kind),
-                                  stats::Fit(asked, {input.values, input.frame}),
+                                  stats::Fit(asked, Ascending(input, series)),
                                   {},
                                   {},
                                   {},
