@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
+#include <numeric>
 
 #include "stats/jackknife.h"
 #include "stats/monte_carlo.h"
@@ -44,6 +45,17 @@ void RunTests(const EngineInput& input, SeriesResults& series) {
         series.trend = stats::TrendTestOf(input.values);
     if (input.tests.shift)
         series.shift = stats::ShiftTestOf(input.values, input.sampleNumbers);
+}
+
+// Equal values in the order in which they were observed.
+void Sort(const EngineInput& input, SeriesResults& series) {
+    series.places.resize(input.values.size());
+    std::iota(series.places.begin(), series.places.end(), std::size_t{1});
+    std::stable_sort(series.places.begin(), series.places.end(), [&](std::size_t a, std::size_t b) {
+        return input.values[a - 1] < input.values[b - 1];
+    });
+    for (const std::size_t place : series.places)
+        series.ascending.push_back(input.values[place - 1]);
 }
 
 // One longer than all time has an event only where the distribution has an upper bound, and one
@@ -164,8 +176,7 @@ std::optional<SeriesResults> AnalyseSeries(const EngineInput& input) {
     SeriesResults series;
     series.histogram = std::move(*histogram);
     series.statistics = stats::SampleStatisticsOf(input.values);
-    series.ascending = input.values;
-    stats::SortAscending(series.ascending);
+    Sort(input, series);
     RunTests(input, series);
     FindEvents(input, series);
     series.curveAbscissae = stats::DensityCurveAbscissae(series.histogram, input.frame.kind);
