@@ -19,7 +19,7 @@ bool AreAllEqual(std::span<const double> values) {
 /// Whether a fault is what a sample without spread comes to; the others say more than that it has
 /// none.
 bool ComesFromSpread(stats::FitFault fault) {
-    return fault >= stats::FitFault::SkewnessOutOfRange && fault < stats::FitFault::NotAvailable;
+    return fault >= stats::FitFault::SkewnessOutOfRange;
 }
 
 int TextIdOf(const stats::FitFailure& failure) {
@@ -43,13 +43,12 @@ std::string ReasonOf(const stats::FitFailure& failure) {
 } // namespace
 
 std::string FitFailureText(const stats::FitFailure& failure, std::span<const double> values) {
-    const std::string code = stats::FailureCode(failure);
     const std::string reason =
         ComesFromSpread(failure.fault) && AreAllEqual(values)
             ? FormatText(kTextCliFitAllEqual, static_cast<int>(values.size()),
                          ShortestText(values.front()))
             : ReasonOf(failure);
-    return code.empty() ? reason : code + ": " + reason;
+    return stats::FailureCode(failure) + ": " + reason;
 }
 
 std::string FitWarningText(const stats::FitWarning& warning) {
