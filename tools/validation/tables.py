@@ -12,7 +12,9 @@ def six(value):
 
 def small(value):
     """A difference; rounding alone counts as none."""
-    return "-" if math.isnan(value) else "0" if value == 0 else f"{value:.0e}".replace("e-0", "e-")
+    if math.isnan(value):
+        return "-"
+    return "0" if value == 0 else f"{value:.0e}".replace("e-0", "e-")
 
 
 def _parameters(fit):
@@ -78,11 +80,17 @@ def _count(comparisons):
     worst = max(c.difference for c in equations)
     base = max(c.difference for c in likelihoods if c.peer.startswith("base R"))
     package = max(c.difference for c in likelihoods if not c.peer.startswith("base R"))
-    gains = [c.gain for c in likelihoods if not math.isnan(c.gain)]
+    gains = [c for c in likelihoods if not math.isnan(c.gain)]
+    lowest, highest = min(gains, key=lambda c: c.gain), max(gains, key=lambda c: c.gain)
     return (f"{len(names)} names, {len(made)} comparisons. Largest relative difference of fits by moments "
             f"and L-moments {small(worst)}, by maximum likelihood {small(base)} to base R and "
-            f"{small(package)} to the packages, whose likelihoods the program's exceed by "
-            f"{small(min(gains))} to {small(max(gains))}.")
+            f"{small(package)} to the packages. The program's log-likelihood less the peer's lies "
+            f"between {small(lowest.gain)} ({_place(lowest)}) and {small(highest.gain)} "
+            f"({_place(highest)}).")
+
+
+def _place(c):
+    return f"{c.fit.name} of {c.fit.series.name}"
 
 
 def fits_table(comparisons, series):
