@@ -109,6 +109,22 @@ def fits_table(comparisons, series):
     return "\n\n".join(parts)
 
 
+def literature_table(printed):
+    """One row for each fit: printed numbers and the program's."""
+    groups = {}
+    for p in printed:
+        groups.setdefault((p.fit.name, p.fit.series.name, p.source), []).append(p)
+    rows = []
+    for (name, series, source), group in groups.items():
+        rows.append([name, series, source, ", ".join(f"{p.quantity} {p.text}" for p in group),
+                     ", ".join(f"{p.ours:.7g}" for p in group)])
+    beyond = [f"{p.quantity} of {p.fit.name} on {p.fit.series.name} ({p.difference / abs(p.ours):.0e})"
+              for p in printed if not p.in_last_digit]
+    text = f"{len(printed)} numbers, {len(printed) - len(beyond)} of them met within one unit of the last digit"
+    text += "; beyond that (relative): " + ", ".join(beyond) + "." if beyond else "."
+    return _lines(["name", "series", "source", "printed", "program"], rows) + "\n\n" + text
+
+
 def _refused_or(fit, text):
     return f"refused: {fit.failed}" if fit.failed else text
 

@@ -14,6 +14,7 @@ import os
 import sys
 
 import comparison
+import literature
 import program
 import published
 import tables
@@ -49,15 +50,21 @@ def show(options, mark, text):
         tables.put_between_marks(options.docs, mark, text)
 
 
-def validate_fits(options, ryn):
+def validate_fits(options, ryn, series):
     """Against R; the faults."""
-    series = program.read_series(os.path.join(HERE, "series.csv"), SERIES)
     comparisons = comparison.compare(all_fits(ryn, series))
     show(options, "validation table", tables.fits_table(comparisons, series))
     if options.out:
         os.makedirs(os.path.dirname(os.path.abspath(options.out)), exist_ok=True)
         tables.write_csv(options.out, comparisons)
     return [f"{c.fit.name} {c.fit.series.name}: {c.fault()}" for c in comparisons if c.fault()]
+
+
+def validate_literature(options, ryn, series):
+    """Against printed fits; the faults."""
+    printed = literature.read(ryn, series)
+    show(options, "printed fits", tables.literature_table(printed))
+    return [f"{p.fit.name} {p.fit.series.name}: {p.fault()}" for p in printed if p.fault()]
 
 
 def validate_published(options, ryn):
@@ -70,7 +77,8 @@ def validate_published(options, ryn):
 def main():
     options = arguments()
     ryn = program.Program(options.ryn)
-    faults = validate_fits(options, ryn)
+    series = program.read_series(os.path.join(HERE, "series.csv"), SERIES)
+    faults = validate_fits(options, ryn, series) + validate_literature(options, ryn, series)
     if options.published:
         faults += validate_published(options, ryn)
     for fault in faults:
