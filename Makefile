@@ -50,7 +50,7 @@ bench: build
 
 validation: build
 	@tools/install-packages tools/validation/packages.txt
-	tools/validation/validate.py build/release/bin/ryn --docs docs/methods.md \
+	PYTHONDONTWRITEBYTECODE=1 tools/validation/validate.py build/release/bin/ryn --docs docs/methods.md \
 		--out build/validation/fits.csv $(if $(PUBLISHED),--published $(PUBLISHED))
 
 fuzz: build/fuzz/build.ninja

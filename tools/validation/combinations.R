@@ -47,8 +47,8 @@ bound_by_median <- function(x) {
   with_bound(x, symmetric_bound(min(x), max(x), median(x)))
 }
 
-# Three moments of x = exp(xi + alpha w), w gamma of shape kappa: for each alpha the kappa that gives
-# the ratio of the second, then alpha from that of the third.
+# Three moments of x = exp(xi + alpha w), w gamma of shape kappa: for each alpha the kappa that
+# gives the ratio of the second, then alpha from that of the third.
 log_pearson_of_real_moments <- function(x) {
   centre <- mean(log(x))
   x <- x / exp(centre)
@@ -90,9 +90,9 @@ by_theory <- function(method, theory) {
     WEI2 = function(x, xi) of_h(fit_above(at(x), theory, weibull, h_range, xi)),
     P3 = function(x, xi) fit_pearson(at(x), theory),
     GAM = function(x, xi) {
-      p <- fit_above(at(x), theory, list(lower = function(p, v) qgamma(p, exp(v)),
-                                         upper = function(e, v) qgamma(e, exp(v), lower.tail = FALSE)),
-                     c(-5, 9), xi)
+      in_logarithm <- list(lower = function(p, v) gamma1$lower(p, exp(v)),
+                           upper = function(e, v) gamma1$upper(e, exp(v)))
+      p <- fit_above(at(x), theory, in_logarithm, c(-5, 9), xi)
       c(p[1:2], exp(p[3]))
     },
     LN2 = function(x, xi) of_scale(fit_above(at(x), theory, lognormal, sigma_range, xi)),

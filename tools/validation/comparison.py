@@ -75,7 +75,8 @@ class Comparison:
 
 def _task(name, series):
     threshold = "" if series.threshold is None else repr(series.threshold)
-    return f"{name},{series.kind},{series.name},{series.path},{threshold},{series.exceedance(100)!r}\n"
+    path = '"' + series.path.replace('"', '""') + '"'
+    return f"{name},{series.kind},{series.name},{path},{threshold},{series.exceedance(100)!r}\n"
 
 
 def _number(cell):

@@ -12,9 +12,11 @@ pareto <- list(lower = function(p, k) standard(-log1p(-p), k),
 # In h = 1/kappa.
 weibull <- list(lower = function(p, h) (-log1p(-p))^h, upper = function(e, h) (-log(e))^h)
 frechet <- list(lower = function(p, h) (-log(p))^-h, upper = function(e, h) (-log1p(-e))^-h)
-gamma1 <- list(lower = function(p, k) qgamma(p, k), upper = function(e, k) qgamma(e, k, lower.tail = FALSE))
+gamma1 <- list(lower = function(p, k) qgamma(p, k),
+               upper = function(e, k) qgamma(e, k, lower.tail = FALSE))
 # The gamma distribution turned left for right.
-mirrored <- list(lower = function(p, k) -gamma1$upper(p, k), upper = function(e, k) -gamma1$lower(e, k))
+mirrored <- list(lower = function(p, k) -gamma1$upper(p, k),
+                 upper = function(e, k) -gamma1$lower(e, k))
 lognormal <- list(lower = function(p, s) exp(s * qnorm(p)),
                   upper = function(e, s) exp(s * qnorm(e, lower.tail = FALSE)))
 
@@ -38,11 +40,13 @@ log_density <- list(
   },
   WEI = function(x, p) {
     z <- (x - p[1]) / p[2]
-    inside(p[2] > 0 & p[3] > 0 & z >= 0, log(p[3] / p[2]) + (p[3] - 1) * log(pmax(z, 0)) - pmax(z, 0)^p[3])
+    v <- pmax(z, 0)
+    inside(p[2] > 0 & p[3] > 0 & z >= 0, log(p[3] / p[2]) + (p[3] - 1) * log(v) - v^p[3])
   },
   FRE = function(x, p) {
     w <- x / p[1]
-    inside(p[1] > 0 & w > 0, log(p[2] / p[1]) - (p[2] + 1) * log(pmax(w, 1e-300)) - pmax(w, 1e-300)^-p[2])
+    v <- pmax(w, 1e-300)
+    inside(p[1] > 0 & w > 0, log(p[2] / p[1]) - (p[2] + 1) * log(v) - v^-p[2])
   },
   P3 = function(x, p) {
     z <- (x - p[1]) / p[2]

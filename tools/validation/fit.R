@@ -3,8 +3,8 @@
 #     Rscript fit.R < tasks.csv > fits.csv
 #
 # Tasks: name,kind,series,file,threshold,exceedance (kind AMS or PDS; threshold empty for AMS).
-# Fits: name,kind,series,peer,p1,p2,p3,event,logLikelihood, of the estimated parameters in the order of the
-# program's results; a fit that cannot be made gives a row with NA in place of all numbers.
+# Fits: name,kind,series,peer,p1,p2,p3,event,logLikelihood, of the estimated parameters in the order
+# of the program's results; a fit that cannot be made gives a row with NA in place of all numbers.
 
 here <- dirname(sub("^--file=", "", grep("^--file=", commandArgs(), value = TRUE)))
 for (part in c("distributions", "moments", "likelihood", "combinations", "peers"))
@@ -18,8 +18,8 @@ family_of <- function(name) {
   families <- c(GEV = "GEV", GUM = "GEV", WEI = "WEI", WEI2 = "WEI", WEI3 = "WEI", FRE = "FRE",
                 GP = "GP", GP2 = "GP", GP3 = "GP", P3 = "P3", GAM = "P3", LP3 = "LP3", LN2 = "LN",
                 LN3 = "LN", SQE = "SQE", EXP1 = "GP", EXP2 = "GP", TGUM = "TGUM")
-  listed <- switch(code, GUM = 1:2, EXP2 = 1:2, WEI2 = , GP2 = , GAM = , LN2 = 2:3, EXP1 = 2, FRE = ,
-                   SQE = , TGUM = 1:2, 1:3)
+  listed <- switch(code, GUM = , EXP2 = , FRE = , SQE = , TGUM = 1:2,
+                   WEI2 = , GP2 = , GAM = , LN2 = 2:3, EXP1 = 2, 1:3)
   list(family = families[[code]], listed = listed)
 }
 
@@ -38,8 +38,9 @@ row_of <- function(task, x, p) {
 
 # A truncated Gumbel distribution without a maximum is the exponential one, whose xi has no meaning.
 exponential_row <- function(task, x) {
-  m <- mean(x - task$threshold)
-  c(NA, m, NA, task$threshold - m * log(task$exceedance), sum(dexp(x - task$threshold, 1 / m, log = TRUE)))
+  y <- x - task$threshold
+  event <- task$threshold - mean(y) * log(task$exceedance)
+  c(NA, mean(y), NA, event, sum(dexp(y, 1 / mean(y), log = TRUE)))
 }
 
 emit <- function(task, peer, numbers) {

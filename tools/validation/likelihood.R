@@ -95,7 +95,8 @@ fit_square_root <- function(x) {
   ll <- function(p) sum(log_density$SQE(x, p))
   grid <- exp(seq(log(1e-3), log(1e5), length.out = 400)) / mean(x)
   best <- which.max(sapply(grid, function(b) ll(c(a_of(b), b))))
-  b <- optimise(function(b) ll(c(a_of(b), b)), grid[best + c(-1, 1)], maximum = TRUE, tol = 1e-12)$maximum
+  b <- optimise(function(b) ll(c(a_of(b), b)), grid[best + c(-1, 1)], maximum = TRUE,
+                tol = 1e-12)$maximum
   maximise_log(ll, c(a_of(b), b))
 }
 

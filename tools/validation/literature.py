@@ -1,7 +1,7 @@
 """Fits printed in books and manuals: literature.csv, a row for each number.
 
-Its last column says how near, relative, a number must be that is not met to its last digit: books round
-on their way, and Hosking's approximations of a shape by its L-skewness are good to some 1e-3.
+Its last column says how near, relative, a number must be that is not met to its last digit: books
+round on their way, and Hosking's approximations of a shape by its L-skewness are good to some 1e-3.
 """
 
 import csv
@@ -71,7 +71,8 @@ def read(ryn, series):
         for row in csv.DictReader(file):
             key = row["name"], row["series"]
             if key not in fits:
-                fits[key] = ryn.fit(row["name"], _series_for(ryn, row["name"], by_name[row["series"]]))
+                own = _series_for(ryn, row["name"], by_name[row["series"]])
+                fits[key] = ryn.fit(row["name"], own)
             found.append(Printed(fits[key], row["quantity"], row["published"], row["source"],
                                  float(row["within"]), _quantity(fits[key], row["quantity"])))
     return found

@@ -59,7 +59,8 @@ def read_series(table, directory):
             path = os.path.join(directory, row["name"] + ".txt")
             with open(path, encoding="utf-8") as text:
                 values = [float(line) for line in text if not line.startswith("#")]
-            found.append(Series(row["name"], row["kind"], row["caption"], row["source"], path, row["shown"] == "yes",
+            found.append(Series(row["name"], row["kind"], row["caption"], row["source"], path,
+                                row["shown"] == "yes",
                                 float(row["threshold"]) if row["threshold"] else None,
                                 float(row["years"]) if row["years"] else None, values))
     return found
@@ -72,14 +73,17 @@ class Program:
         self.path = os.path.abspath(path)
 
     def _run(self, *arguments, check=True):
-        return subprocess.run([self.path, *arguments, "--lang", "en"], capture_output=True, text=True,
-                              check=check)
+        return subprocess.run([self.path, *arguments, "--lang", "en"], capture_output=True,
+                              text=True, check=check)
 
     def names(self, kind):
         """All names that can arise: the message about a wrong one lists them."""
         options = [] if kind == "AMS" else ["--pds", "--rate", "1", "--threshold", "0"]
         answer = self._run("fit", "?", os.devnull, *options, check=False).stderr
-        return re.search(r"on offer for [a-z ]+: (.*)", answer).group(1).split(", ")
+        offered = re.search(r"on offer for [a-z ]+: (.*)", answer)
+        if not offered:
+            raise ValueError(f"{self.path} lists no names: {answer}")
+        return offered.group(1).split(", ")
 
     def fit(self, name, series):
         """The fit of a series, by the full numbers of --json."""
@@ -92,8 +96,8 @@ class Program:
         return fit_of(name, series, json.loads(answer))
 
     def analysis(self, values, *settings):
-        """The results of a whole analysis of annual maxima with GUM/MOM, as `info` tells them. A data
-        file holds 32-bit numbers, so that the values lose digits beyond the seventh."""
+        """The results of a whole analysis of annual maxima with GUM/MOM, as `info` tells them. A
+        data file holds 32-bit numbers, so that the values lose digits beyond the seventh."""
         with tempfile.TemporaryDirectory() as folder:
             at = lambda name: os.path.join(folder, name)
             with open(at("table.csv"), "w", encoding="utf-8") as table:
@@ -109,8 +113,8 @@ class Program:
 
     def _fit_corrected(self, series):
         """Gumbel's constants of the sample size are an option of an analysis, not of a name."""
-        results = self.analysis(series.values, "ProbabilityDistribution.Item1.SampleCorrection=true",
-                                "Analysis.LogLikelihood=true")
+        results = self.analysis(series.values, "Analysis.LogLikelihood=true",
+                                "ProbabilityDistribution.Item1.SampleCorrection=true")
         item = results["DistributionAnalysis"]["Item1"]
         parameters = [(item["ParameterEstimates"][f"strParEst{i}"],
                        item["ParameterEstimates"][f"ParEst{i}"]) for i in (1, 2)]

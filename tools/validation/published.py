@@ -1,7 +1,7 @@
-"""Published and independently checked fits of annual maxima, from a table of a collection of series.
+"""Published and independently checked fits of annual maxima, from a table of a collection of them.
 
-The table, reference_fits.csv, has a row for each series: its file and column beside the table, n, mean,
-sd, skew (G1), l1, l2, t3, t4, and the maximum likelihood fits of the GEV (gev_loc, gev_scale,
+The table, reference_fits.csv, has a row for each series: its file and column beside the table, n,
+mean, sd, skew (G1), l1, l2, t3, t4, and the maximum likelihood fits of the GEV (gev_loc, gev_scale,
 gev_shape_xi, which is -kappa, gev_nllh) and Gumbel distributions (gum_loc, gum_scale, gum_nllh).
 """
 
@@ -35,8 +35,8 @@ class Published:
         return float(self.row[key])
 
     def statistics_difference(self):
-        """The largest difference among the statistics in units of the table's last digit, or of what
-        the 32-bit numbers of a data file leave uncertain where that is more."""
+        """The largest difference among the statistics in units of the table's last digit, or of
+        what the 32-bit numbers of a data file leave uncertain where that is more."""
         level = abs(self.number("mean"))
         in_units = {"mean", "sd", "l1", "l2"}
         return max(_digits_off(value, self.row[key],
@@ -53,7 +53,8 @@ class Published:
         pairs = []
         if not self.gev.failed:
             (_, xi), (_, alpha), (_, kappa) = self.gev.parameters
-            pairs += [abs(xi / self.number("gev_loc") - 1), abs(alpha / self.number("gev_scale") - 1),
+            pairs += [abs(xi / self.number("gev_loc") - 1),
+                      abs(alpha / self.number("gev_scale") - 1),
                       abs(kappa + self.number("gev_shape_xi"))]
         (_, xi), (_, alpha) = self.gumbel.parameters
         pairs += [abs(xi / self.number("gum_loc") - 1), abs(alpha / self.number("gum_scale") - 1)]
@@ -85,8 +86,9 @@ def _column(path, name):
 def _statistics(results):
     moments = results["OrdinaryMoments"]
     l = results["LMoments"]
-    return {"mean": moments["Mean"], "sd": math.sqrt(moments["Variance"]), "skew": moments["Skewness"],
-            "l1": l["L_1"], "l2": l["L_2"], "t3": l["L_skewness"], "t4": l["L_Kurtosis"]}
+    return {"mean": moments["Mean"], "sd": math.sqrt(moments["Variance"]),
+            "skew": moments["Skewness"], "l1": l["L_1"], "l2": l["L_2"],
+            "t3": l["L_skewness"], "t4": l["L_Kurtosis"]}
 
 
 def _fits(ryn, values):

@@ -56,8 +56,9 @@ def _row(group, turn):
     if refused:
         everywhere += "; refused: " + ", ".join(refused)
     fit = shown.fit
-    return [fit.name.replace(" (", ", ").rstrip(")"), fit.series.name, str(len(fit.series.values)), _parameters(fit), six(fit.event),
-            six(fit.log_likelihood), shown.peer, small(shown.difference), _gain(shown), everywhere]
+    return [fit.name.replace(" (", ", ").rstrip(")"), fit.series.name, str(len(fit.series.values)),
+            _parameters(fit), six(fit.event), six(fit.log_likelihood), shown.peer,
+            small(shown.difference), _gain(shown), everywhere]
 
 
 def _lines(heading, rows):
@@ -82,9 +83,9 @@ def _count(comparisons):
     package = max(c.difference for c in likelihoods if not c.peer.startswith("base R"))
     gains = [c for c in likelihoods if not math.isnan(c.gain)]
     lowest, highest = min(gains, key=lambda c: c.gain), max(gains, key=lambda c: c.gain)
-    return (f"{len(names)} names, {len(made)} comparisons. Largest relative difference of fits by moments "
-            f"and L-moments {small(worst)}, by maximum likelihood {small(base)} to base R and "
-            f"{small(package)} to the packages. The program's log-likelihood less the peer's lies "
+    return (f"{len(names)} names, {len(made)} comparisons. Largest relative difference of fits by "
+            f"moments and L-moments {small(worst)}, by maximum likelihood {small(base)} to base R "
+            f"and {small(package)} to the packages. The program's log-likelihood less the peer's lies "
             f"between {small(lowest.gain)} ({_place(lowest)}) and {small(highest.gain)} "
             f"({_place(highest)}).")
 
@@ -118,9 +119,10 @@ def literature_table(printed):
     for (name, series, source), group in groups.items():
         rows.append([name, series, source, ", ".join(f"{p.quantity} {p.text}" for p in group),
                      ", ".join(f"{p.ours:.7g}" for p in group)])
-    beyond = [f"{p.quantity} of {p.fit.name} on {p.fit.series.name} ({p.difference / abs(p.ours):.0e})"
-              for p in printed if not p.in_last_digit]
-    text = f"{len(printed)} numbers, {len(printed) - len(beyond)} of them met within one unit of the last digit"
+    beyond = [f"{p.quantity} of {p.fit.name} on {p.fit.series.name} "
+              f"({small(p.difference / abs(p.ours))})" for p in printed if not p.in_last_digit]
+    text = (f"{len(printed)} numbers, {len(printed) - len(beyond)} of them met within one unit of "
+            "the last digit")
     text += "; beyond that (relative): " + ", ".join(beyond) + "." if beyond else "."
     return _lines(["name", "series", "source", "printed", "program"], rows) + "\n\n" + text
 
@@ -151,13 +153,15 @@ def _published_summary(rows):
     gains = [gain for r in rows for gain in r.gains() if not math.isnan(gain)]
     worst = max((r for r in rows if not r.gev.failed), key=lambda r: r.parameter_difference())
     refused = [f"{r.caption} ({r.gev.failed})" for r in rows if r.gev.failed]
-    text = (f"{len(rows)} series, {len(gains)} likelihoods: the program's less the published one lies "
-            f"between {min(gains):+.4f} and {max(gains):+.4f}, where the published ones are rounded to "
-            "0.001. Mean, standard deviation, skewness and L-moments differ by at most "
+    text = (f"{len(rows)} series, {len(gains)} likelihoods: the program's less the published one "
+            f"lies between {min(gains):+.4f} and {max(gains):+.4f}, where the published ones are "
+            "rounded to 0.001. Mean, standard deviation, skewness and L-moments differ by at most "
             f"{max(r.statistics_difference() for r in rows):.2f} units of the last digit given. "
             "Largest difference of a location or scale (relative) or of the shape: "
             f"{worst.parameter_difference():.0e} ({worst.caption}).")
-    return text + (" Refused by the program: GEV/ML of " + ", ".join(refused) + "." if refused else "")
+    if refused:
+        text += " Refused by the program: GEV/ML of " + ", ".join(refused) + "."
+    return text
 
 
 def write_csv(path, comparisons):
@@ -169,10 +173,11 @@ def write_csv(path, comparisons):
         for c in comparisons:
             fit = c.fit
             difference = "" if fit.failed or not c.made_by_peer else repr(c.difference)
-            out.writerow([fit.series.kind, fit.name, fit.series.name, len(fit.series.values), c.peer,
-                          fit.failed, " ".join(repr(v) for _, v in fit.parameters), fit.event,
-                          fit.log_likelihood, " ".join(repr(v) for v in c.numbers), c.log_likelihood,
-                          difference])
+            ours = " ".join(repr(value) for _, value in fit.parameters)
+            theirs = " ".join(repr(value) for value in c.numbers)
+            out.writerow([fit.series.kind, fit.name, fit.series.name, len(fit.series.values),
+                          c.peer, fit.failed, ours, fit.event, fit.log_likelihood, theirs,
+                          c.log_likelihood, difference])
 
 
 def put_between_marks(path, mark, text):

@@ -4,9 +4,10 @@
     tools/validation/validate.py RYN [--out FILE.csv] [--docs docs/methods.md]
                                     [--published DIRECTORY]
 
-Prints the table of docs/methods.md and, with --docs, puts it there between its two marks; --out takes
-every number of every fit. A directory with reference_fits.csv, a collection of series with published
-fits (published.py tells its form), gives a second table. The exit code is 1 when a difference is larger than demanded.
+Prints the tables of docs/methods.md and, with --docs, puts them there between their marks; --out
+takes every number of every fit. A directory with reference_fits.csv, a collection of series with
+published fits (published.py tells its form), gives one more table. The exit code is 1 when a
+difference is larger than demanded.
 """
 
 import argparse
