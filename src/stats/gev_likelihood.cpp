@@ -19,33 +19,60 @@ double EdgeOn(Side side, std::span<const double> values) {
                                     : *std::min_element(values.begin(), values.end());
 }
 
+// The walks need no more than the signs of the profile's slopes, and Newton's method in both
+// unknowns does the rest. Should that go astray, the walks alone can do it.
+struct Search {
+    int upwards; ///< steps to the largest shape; towards an upper bound profiles are steeper
+    int downwards;
+    GevProfile::Closeness closeness;
+    double precision;
+};
+constexpr Search kQuick{4, 3, {0.2, 0.1}, 0.02};
+constexpr Search kThorough{6, 4, {0.03, 0.02}, 1e-9};
+
 // The Gumbel fit is the point of the profile at kappa = 0. Its location lies inside the sample, and
 // its scale makes the unknowns free of units.
 GevProfile ProfileOn(Side side, std::span<const double> values, const LocationScale& gumbel,
-                     LikelihoodBuffer& buffer) {
+                     std::span<double> deviations, const Search& search) {
     const double edge = EdgeOn(side, values);
-    buffer.clear();
-    for (const double x : values) {
-        buffer.push_back((x - edge) / gumbel.alpha);
-    }
-    return {buffer, (edge - gumbel.xi) / gumbel.alpha};
+    std::transform(values.begin(), values.end(), deviations.begin(),
+                   [&](double x) { return (x - edge) / gumbel.alpha; });
+    return {deviations, (edge - gumbel.xi) / gumbel.alpha, search.closeness};
 }
 
+struct Found {
+    Side side;
+    std::optional<GevProfile::Maximum> maximum; ///< none where Newton's method went astray
+};
+
 // Both walks begin at the Gumbel fit, so that each keeps to the path of the best scales. Profiles
-// with two maxima have them 0.4 and more apart; towards an upper bound they are steeper. For a
-// summit at kappa = 0 rounding may make either walk leave it to the other.
-std::optional<Peak> HighestPeak(std::span<const double> values, const LocationScale& gumbel,
-                                LikelihoodBuffer& buffer) {
+// with two maxima have them 0.4 and more apart. For a summit at kappa = 0 rounding may make either
+// walk leave it to the other. Nothing where no maximum is met.
+std::optional<Found> HighestMaximum(std::span<const double> values, const LocationScale& gumbel,
+                                    LikelihoodBuffer& buffer, const Search& search) {
     constexpr double kLargestShape = 0.98;
-    PeakSearch search;
-    const ProfilePoint up =
-        search.Walk(ProfileOn(Side::UpperBound, values, gumbel, buffer), 0, kLargestShape, 6);
-    const ProfilePoint down =
-        search.Walk(ProfileOn(Side::LowerBound, values, gumbel, buffer), 0, -kLargestShape, 4);
+    const std::size_t count = values.size();
+    buffer.resize(2 * count);
+    const std::span<double> deviations(buffer);
+    GevProfile upper = ProfileOn(Side::UpperBound, values, gumbel, deviations.first(count), search);
+    GevProfile lower = ProfileOn(Side::LowerBound, values, gumbel, deviations.last(count), search);
+    PeakSearch peaks(search.precision);
+    const ProfilePoint up = peaks.Walk(upper, 0, kLargestShape, search.upwards);
+    const ProfilePoint down = peaks.Walk(lower, 0, -kLargestShape, search.downwards);
     if (up.slope <= 0 && down.slope > 0) {
-        search.Note({0, up.value});
+        peaks.Note({0, up.value});
     }
-    return search.Highest();
+    if (!peaks.Highest()) {
+        return std::nullopt;
+    }
+    const double kappa = peaks.Highest()->place;
+    const Side side = kappa > 0 ? Side::UpperBound : Side::LowerBound;
+    GevProfile& profile = side == Side::UpperBound ? upper : lower;
+    auto maximum = profile.MaximumNear(kappa);
+    if (!maximum && search.precision == kThorough.precision) {
+        maximum = profile.PathAt(kappa);
+    }
+    return Found{side, maximum};
 }
 
 } // namespace
@@ -56,17 +83,18 @@ Outcome<Gev> MostLikelyGev(std::span<const double> values, LikelihoodBuffer& buf
         return gumbel.Failure();
     }
     const LocationScale& unit = gumbel->Values();
-    const auto peak = HighestPeak(values, unit, buffer);
-    if (!peak) {
+    auto found = HighestMaximum(values, unit, buffer, kQuick);
+    if (found && !found->maximum) {
+        found = HighestMaximum(values, unit, buffer, kThorough);
+    }
+    if (!found || !found->maximum) {
         return FitFailure{FitFault::NoInteriorMaximum};
     }
     // y = t + ln mean(exp(-t)) is the reduced variate: 0 at xi, with slope 1/alpha there.
-    const double kappa = peak->place;
-    const Side side = kappa > 0 ? Side::UpperBound : Side::LowerBound;
-    const auto [b, logMeanWeight] = ProfileOn(side, values, unit, buffer).RestAt(kappa);
+    const auto [kappa, b, logMeanWeight] = *found->maximum;
     const double alpha = unit.alpha * std::exp(kappa * logMeanWeight) / b;
     const double xi =
-        EdgeOn(side, values) + unit.alpha * StandardOfReduced(-logMeanWeight, kappa) / b;
+        EdgeOn(found->side, values) + unit.alpha * StandardOfReduced(-logMeanWeight, kappa) / b;
     return Checked(Gev::Make({xi, alpha, kappa}));
 }
 

@@ -1,7 +1,9 @@
 #pragma once
 
+#include "stats/fixed_list.h"
 #include "stats/profile_maximum.h"
 
+#include <optional>
 #include <span>
 
 namespace ryn::stats {
@@ -24,22 +26,34 @@ namespace ryn::stats {
 /// Gumbel fit, which hardly changes with kappa.
 class GevProfile {
   public:
+    /// How near to the path an evaluation ends: at a step in ln |t| below `largest` whose square is
+    /// less than `share` of the slope in kappa.
+    struct Closeness {
+        double largest;
+        double share;
+    };
+
     /// `fromEdge` are deviations from the largest value, for kappa >= 0, or from the smallest, for
     /// kappa <= 0, in units of the scale of a Gumbel fit; `edge` is where that value lies from the
     /// location of the fit, in the same units: the path begins at kappa = 0, b = 1. They stay the
     /// caller's.
-    GevProfile(std::span<const double> fromEdge, double edge);
+    GevProfile(std::span<const double> fromEdge, double edge, const Closeness& closeness);
 
     /// |kappa| < 1. No value where b has no best value: with more than half of the values equal to
     /// the smallest, the likelihood of a heavy tail is unbounded.
     ProfilePoint operator()(double kappa);
 
     /// What xi and alpha come from.
-    struct Rest {
+    struct Maximum {
+        double kappa;
         double b;
         double logMeanWeight; ///< ln mean(exp(-t)), minus the location in t
     };
-    Rest RestAt(double kappa);
+    /// The maximum in both unknowns next to `kappa`, by Newton's method: the end is a step below
+    /// 2e-7 in kappa and ln b, which is still taken. Nothing where it goes astray.
+    std::optional<Maximum> MaximumNear(double kappa);
+    /// The path at `kappa`, for a maximum that is known closely.
+    Maximum PathAt(double kappa);
 
   private:
     /// Value and derivatives in ln b and kappa.
@@ -51,6 +65,8 @@ class GevProfile {
         double bKappa;
         double kappaKappa;
         double logMeanWeight;
+        double weightB; ///< minus the derivatives of logMeanWeight
+        double weightKappa;
     };
     /// Where the path is, as far as one pass over the sample tells.
     struct Sight {
@@ -60,16 +76,25 @@ class GevProfile {
         double pathSlope;   ///< of ln |t|, in kappa
     };
 
+    /// A place on the path, with its slope there.
+    struct PathPoint {
+        double kappa = 0;
+        double logT = 0;
+        double slope = 0; ///< of logT, in kappa
+    };
+
+    double ExpectedLogT(double kappa) const;
+    void GoBackTo(double kappa);
     Surface SurfaceAt(double b, double kappa) const;
     double ScaleAt(double logT, double kappa) const;
     Sight Look(double logT, double kappa) const;
 
     std::span<const double> fromEdge;
     double edge;
-    double least;         ///< of the deviations
-    double lastKappa = 0; ///< where the path was met last
-    double lastLogT;
-    double pathSlope = 0;
+    double least; ///< of the deviations
+    Closeness closeness;
+    PathPoint last;                ///< where the path was met last
+    FixedList<PathPoint, 64> path; ///< where it was met before, as far as there is room
 };
 
 } // namespace ryn::stats
