@@ -42,7 +42,7 @@ std::optional<Peak> HighestPeak(std::span<const double> values, const LocationSc
         search.Walk(ProfileOn(Side::UpperBound, values, gumbel, buffer), 0, kLargestShape, 6);
     const ProfilePoint down =
         search.Walk(ProfileOn(Side::LowerBound, values, gumbel, buffer), 0, -kLargestShape, 4);
-    if (up.slope <= 0 && down.slope > 0) {
+    if (up.slope <= 0 && down.slope > 0 && up.curvature < 0) {
         search.Note({0, up.value});
     }
     return search.Highest();
