@@ -59,7 +59,7 @@ std::optional<Found> HighestMaximum(std::span<const double> values, const Locati
     PeakSearch peaks(search.precision);
     const ProfilePoint up = peaks.Walk(upper, 0, kLargestShape, search.upwards);
     const ProfilePoint down = peaks.Walk(lower, 0, -kLargestShape, search.downwards);
-    if (up.slope <= 0 && down.slope > 0) {
+    if (up.slope <= 0 && down.slope > 0 && up.curvature < 0) {
         peaks.Note({0, up.value});
     }
     if (!peaks.Highest()) {
@@ -69,6 +69,10 @@ std::optional<Found> HighestMaximum(std::span<const double> values, const Locati
     const Side side = kappa > 0 ? Side::UpperBound : Side::LowerBound;
     GevProfile& profile = side == Side::UpperBound ? upper : lower;
     auto maximum = profile.MaximumNear(kappa);
+    if (maximum && (std::abs(maximum->kappa) > kLargestShape ||
+                    std::abs(maximum->kappa - kappa) > 5 * kQuick.precision)) {
+        maximum.reset(); // another place than the one that the walks met
+    }
     if (!maximum && search.precision == kThorough.precision) {
         maximum = profile.PathAt(kappa);
     }
