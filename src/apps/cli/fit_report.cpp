@@ -70,7 +70,7 @@ void PrintGoodness(std::ostream& out, const FitReport& report) {
         FormatText(kTextCliClasses, chiSquared.classes.size(), chiSquared.degreesOfFreedom);
     TextTable table({Alignment::Left, Alignment::Right, Alignment::Left});
     table.AddRow({TextOf(kTextCliChiSquared), NumberText(chiSquared.statistic),
-                  LevelText(chiSquared.level) + ", " + classes});
+                  LevelText(chiSquared.level) + classes});
     table.AddRow({TextOf(kTextCliKolmogorovSmirnov),
                   NumberText(goodness.kolmogorovSmirnov.statistic),
                   LevelText(goodness.kolmogorovSmirnov.level)});
