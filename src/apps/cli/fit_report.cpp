@@ -157,6 +157,8 @@ void PrintFit(std::ostream& out, const FitReport& report) {
     PrintParameters(out, *report.model);
     out << '\n';
     PrintGoodness(out, report);
+    if (report.periods.empty())
+        return;
     out << '\n';
     PrintQuantiles(out, report);
     PrintResamples(out, report);

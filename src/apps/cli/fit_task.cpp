@@ -72,7 +72,7 @@ Status AddCombinations(const FitOptions& options, FitTask* task) {
     const std::vector<std::string> names = options.names == kAllNames
                                                ? GeneratedNames(SelectionMethodOf(options))
                                                : PartsOf(options.names);
-    if (names.size() > 1 && std::find(names.begin(), names.end(), "") != names.end())
+    if (std::find(names.begin(), names.end(), "") != names.end())
         return BadValue("NAME", options.names, kTextCliExpectNames);
     for (const std::string& name : names)
         if (Status added = AddCombination(name, options, task); !added)
