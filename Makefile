@@ -4,6 +4,8 @@
 # make sanitize  every test under the address and undefined-behaviour sanitizers
 # make lint      formatting, clang-tidy, the order of the folders
 # make bench     the speed table
+# make validation  every fit against the same fit in R; rewrites its tables in docs/methods.md.
+#                  PUBLISHED=DIR adds reference_fits.csv of that directory, with its series
 # make fuzz      each fuzz target for FUZZ_SECONDS seconds (default 600)
 
 JOBS ?= $(shell nproc)
@@ -13,7 +15,7 @@ FUZZ_SECONDS ?= 600
 export CCACHE_BASEDIR := $(CURDIR)
 export CCACHE_NOHASHDIR := 1
 
-.PHONY: run test build sanitize lint bench fuzz format packages clean
+.PHONY: run test build sanitize lint bench validation fuzz format packages clean
 .DEFAULT_GOAL := build
 
 packages:
@@ -45,6 +47,11 @@ format: packages
 
 bench: build
 	bench/run build/release/bin
+
+validation: build
+	@tools/install-packages tools/validation/packages.txt
+	PYTHONDONTWRITEBYTECODE=1 tools/validation/validate.py build/release/bin/ryn --docs docs/methods.md \
+		--out build/validation/fits.csv $(if $(PUBLISHED),--published $(PUBLISHED))
 
 fuzz: build/fuzz/build.ninja
 	cmake --build build/fuzz -j $(JOBS)

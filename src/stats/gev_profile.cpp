@@ -53,13 +53,14 @@ Transformed Transform(double u, double kappa) {
     return bySeries ? BySeries(u, h) : Directly(u, kappa, 1 / kappa);
 }
 
-// Sums over the sample, plain and with the weights w = exp(-t).
+// Sums over the sample, plain and with the weights w = exp(leastT - t).
 struct Sums {
+    double leastT;
     double w = 0, wr = 0, wrr = 0, wrb = 0, wk = 0, wkk = 0, wrk = 0, wCurve = 0;
     double t = 0, r = 0, rr = 0, rb = 0, k = 0, curve = 0;
 
     void Add(const Transformed& at) {
-        const double weight = std::exp(-at.t);
+        const double weight = std::exp(leastT - at.t);
         const double rWeighted = weight * at.r;
         const double kWeighted = weight * at.k;
         const double slopeOfR = at.r / at.q;
@@ -81,40 +82,37 @@ struct Sums {
 };
 
 // Two loops, since all the time of a fit goes here.
-Sums SumsOver(std::span<const double> deviations, double b, double kappa) {
-    Sums sums;
+Sums SumsOver(std::span<const double> fromEdge, double b, double kappa, double leastT) {
+    Sums sums{leastT};
     if (std::abs(kappa) < kSeriesShapes) {
-        for (const double d : deviations) {
+        for (const double d : fromEdge) {
             sums.Add(Transform(b * d, kappa));
         }
     } else {
         const double inverse = 1 / kappa;
-        for (const double d : deviations) {
+        for (const double d : fromEdge) {
             sums.Add(Directly(b * d, kappa, inverse));
         }
     }
     return sums;
 }
 
-double FarthestOn(GevProfile::Side side, std::span<const double> values) {
-    return side == GevProfile::Side::UpperBound ? *std::max_element(values.begin(), values.end())
-                                                : *std::min_element(values.begin(), values.end());
-}
-
 } // namespace
 
-GevProfile::GevProfile(std::span<const double> sample, Side side)
-    : deviations(sample),
-      edge(FarthestOn(side, sample)),
+GevProfile::GevProfile(std::span<const double> sample, double edgeValue)
+    : fromEdge(sample),
+      edge(edgeValue),
+      least(*std::min_element(sample.begin(), sample.end())),
       lastLogT(std::log(std::abs(edge))) {}
 
 // Means with the weights w are moments of a distribution: the derivatives of ln mean(w) are its
 // means, variances and covariance.
 GevProfile::Surface GevProfile::SurfaceAt(double b, double kappa) const {
-    const Sums s = SumsOver(deviations, b, kappa);
-    const auto n = static_cast<double>(deviations.size());
+    const double leastT = Transform(b * least, kappa).t;
+    const Sums s = SumsOver(fromEdge, b, kappa, leastT);
+    const auto n = static_cast<double>(fromEdge.size());
     const double f = (1 - kappa) / n;
-    const double logWeight = std::log(s.w / n);
+    const double logWeight = std::log(s.w / n) - leastT;
     const double r = s.wr / s.w;
     const double k = s.wk / s.w;
     return {std::log(b) - logWeight - f * s.t - 1,
@@ -126,41 +124,46 @@ GevProfile::Surface GevProfile::SurfaceAt(double b, double kappa) const {
             logWeight};
 }
 
+// Seen from the edge, the Gumbel location lies -edge away and at -t.
 double GevProfile::ScaleAt(double logT, double kappa) const {
-    return StandardOfReduced(std::copysign(std::exp(logT), edge), kappa) / edge;
+    return StandardOfReduced(std::copysign(std::exp(logT), edge), -kappa) / edge;
 }
 
-// With m = ln |t| at the edge, d ln b/dm = t/r, whose derivative in m is t/r (1 - t/(r q)).
+// With m = ln |t| and u the edge in units of the scale at the Gumbel location, d ln b/dm = t/u, the
+// derivative of which in m is t/u (1 - t/(b edge)); at a fixed m, d ln b/d kappa = (t/u - 1)/kappa.
 GevProfile::Sight GevProfile::Look(double logT, double kappa) const {
+    const double t = std::copysign(std::exp(logT), edge);
+    const double u = StandardOfReduced(t, kappa);
     const double b = ScaleAt(logT, kappa);
     const Surface at = SurfaceAt(b, kappa);
-    const Transformed end = Transform(b * edge, kappa);
-    const double ratio = end.t / end.r;
+    const double ratio = t / u;
     const double slope = at.b * ratio;
-    const double curvature = ratio * (at.bb * ratio + at.b * (1 - ratio / end.q));
+    const double curvature = ratio * (at.bb * ratio + at.b * (1 - t / (b * edge)));
     if (!std::isfinite(slope)) {
-        return {kNoProfile, std::numeric_limits<double>::quiet_NaN(), 0};
+        return {kNoProfile, -1, 1, 0};
     }
     const double toPath = -at.b / at.bb;
     const double path = -at.bKappa / at.bb;
+    const double drift = std::abs(kappa * u) < 1e-6 ? u / 2 : (ratio - 1) / kappa;
     return {{at.value + at.b * toPath / 2, at.kappa + at.bKappa * toPath,
              at.kappaKappa + at.bKappa * path},
             curvature < 0 ? -slope / curvature : std::copysign(1.0, slope),
-            path / ratio + end.k / end.t};
+            ratio,
+            (path - drift) / ratio};
 }
 
-// Newton's method in ln |t|, in a bracket that the direction of the steps narrows; a pass that
-// overflows has gone too high. It ends where the square of the step is small against the slope in
-// kappa, whose sign then is beyond doubt. At the end of a search in kappa that step is far smaller,
-// and the two searches together make Newton's method in both unknowns.
+// Newton's method in ln |t|, in a bracket that the direction of the steps narrows. It ends where
+// the square of the step, in ln b, is small against the slope in kappa, whose sign then is beyond
+// doubt. At the end of a search in kappa that step is far smaller, and the two searches together
+// make Newton's method in both unknowns.
 ProfilePoint GevProfile::operator()(double kappa) {
     double logT = lastLogT + std::clamp(pathSlope * (kappa - lastKappa), -1.0, 1.0);
     double lower = -std::numeric_limits<double>::infinity();
     double upper = std::numeric_limits<double>::infinity();
     for (int pass = 0; pass < 40; ++pass) {
         const Sight sight = Look(logT, kappa);
-        const double step = std::isnan(sight.step) ? -1 : sight.step;
-        const double size = std::abs(step);
+        const double step = sight.step;
+        const double size = std::abs(step) * sight.scaleSlope;
         if (size < 1e-9 || (size < 0.03 && size * size < 0.02 * std::abs(sight.point.slope))) {
             lastKappa = kappa;
             lastLogT = logT + step;

@@ -88,12 +88,20 @@ class PeakSearch {
     /// The highest value at an end of a walk. Minus infinity before the first.
     double HighestEnd() const { return highestEnd; }
 
+    /// A maximum that is known from elsewhere.
+    void Note(const Peak& peak) {
+        if (!highest || peak.value > highest->value) {
+            highest = peak;
+        }
+    }
+
     /// From `from` to `to`, which may lie on either side, in equal steps. Ends early where the
     /// profile ends. A profile that follows the best values of the other unknowns along the walk
-    /// is asked for neighbouring places one after the other.
+    /// is asked for neighbouring places one after the other. Gives what was found at `from`.
     template <class F>
-    void Walk(F&& profile, double from, double to, int steps) {
+    ProfilePoint Walk(F&& profile, double from, double to, int steps) {
         Station here{from, profile(from)};
+        const ProfilePoint first = here.at;
         NoteEnd(here);
         for (int i = 1; i <= steps && !std::isnan(here.at.slope); ++i) {
             const double place = i == steps ? to : from + (to - from) * i / steps;
@@ -102,6 +110,7 @@ class PeakSearch {
             here = next;
         }
         NoteEnd(here);
+        return first;
     }
 
   private:
@@ -155,9 +164,8 @@ class PeakSearch {
     void Climb(F& profile, const Station& a, const Station& b) {
         const double share = a.at.slope / (a.at.slope - b.at.slope);
         const double start = a.place + share * (b.place - a.place);
-        const auto peak = MaximumBetween(profile, {a.place, b.place}, start);
-        if (peak && (!highest || peak->value > highest->value)) {
-            highest = peak;
+        if (const auto peak = MaximumBetween(profile, {a.place, b.place}, start)) {
+            Note(*peak);
         }
     }
 

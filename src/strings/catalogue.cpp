@@ -313,8 +313,6 @@ constexpr std::array kEntries = std::to_array<Entry>({
     {kTextCliFitInvalidParameters, "parameters are not valid", "母数が正しくありません"},
     {kTextCliFitMeanExceedanceNotPositive, "mean exceedance is not positive",
      "平均超過量が正ではありません"},
-    {kTextCliFitNotAvailable, "this combination is not available in this version",
-     "この組み合わせはこのバージョンでは使えません"},
     {kTextCliFitNotOfferedForPds, "distribution is not offered for a partial duration series",
      "この分布は部分期間系列には使えません"},
     {kTextCliFitOutsideSupport, "%d value(s) lie outside the range of the fitted distribution",

@@ -197,7 +197,6 @@ enum TextId : int {
     kTextCliFitValuesOutsideSupport,
     kTextCliFitInvalidParameters,
     kTextCliFitMeanExceedanceNotPositive,
-    kTextCliFitNotAvailable,
     kTextCliFitNotOfferedForPds,
     // In the order of stats::FitWarningKind.
     kTextCliFitOutsideSupport,

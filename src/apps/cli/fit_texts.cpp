@@ -63,8 +63,7 @@ void AddNoUncertainty(const FitReport& report, std::vector<std::string>& warning
 } // namespace
 
 std::string FitFailureText(const stats::FitFailure& failure) {
-    const std::string code = stats::FailureCode(failure);
-    return (code.empty() ? "" : code + ": ") + ReasonOf(failure);
+    return stats::FailureCode(failure) + ": " + ReasonOf(failure);
 }
 
 std::string FitWarningText(const stats::FitWarning& warning) {

@@ -288,20 +288,20 @@ TEST_F(FitCommand, RefusesASeriesThatCannotBeAnalysed) {
 TEST(FitTexts, SayTheSameAsTheLogAndEachInJapaneseToo) {
     using stats::FitFault;
     std::set<std::string> japanese;
-    for (int fault = 1; fault <= static_cast<int>(FitFault::NotAvailable); ++fault) {
+    constexpr int kLast = static_cast<int>(FitFault::MeanExceedanceNotPositive);
+    for (int fault = 1; fault <= kLast; ++fault) {
         stats::FitFailure failure{static_cast<FitFault>(fault), {12.3456, 7.0}};
         for (const auto kind :
              {stats::SeriesKind::AnnualMaximum, stats::SeriesKind::PartialDuration}) {
             failure.kind = kind;
-            const std::string code = stats::FailureCode(failure);
             SetLanguage(Language::English);
             EXPECT_EQ(FitFailureText(failure),
-                      (code.empty() ? "" : code + ": ") + stats::FailureText(failure));
+                      stats::FailureCode(failure) + ": " + stats::FailureText(failure));
             SetLanguage(Language::Japanese);
             japanese.insert(FitFailureText(failure));
         }
     }
-    EXPECT_EQ(japanese.size(), static_cast<std::size_t>(FitFault::NotAvailable) + 1);
+    EXPECT_EQ(japanese.size(), static_cast<std::size_t>(kLast) + 1);
     SetLanguage(Language::English);
     for (const auto kind : {stats::FitWarningKind::ValuesOutsideSupport,
                             stats::FitWarningKind::SkewnessCorrectionRange,

@@ -113,6 +113,25 @@ TEST(MonteCarlo, LetsTheRateVaryWithTheCountAtPeriodsAlone) {
                 0.03);
 }
 
+// The mean of n exponential exceedances has a gamma distribution of shape n: its 0.025 and 0.975
+// quantiles at n = 44 are 0.726602 and 1.316380 means (base R 4.2).
+TEST(MonteCarlo, EnclosesNinetyFivePercentOfTheResamples) {
+    const Subject subject("EXP1/MOM", "rain40");
+    MonteCarloSettings settings{20'000, 1, EventCount::Fixed};
+    const auto result = subject.Simulated({kPeriods}, settings);
+    for (const ResampledQuantile& q : result.atPeriods) {
+        const double above = q.estimate - 40;
+        EXPECT_NEAR((q.lower - 40) / above, 0.726602, 0.01);
+        EXPECT_NEAR((q.upper - 40) / above, 1.316380, 0.01);
+    }
+    settings.samples = 39; // the least and the largest
+    const auto few = subject.Simulated({kPeriods}, settings).atPeriods[0];
+    EXPECT_LT(few.lower, few.estimate);
+    settings.samples = 38;
+    EXPECT_TRUE(std::isnan(subject.Simulated({kPeriods}, settings).atPeriods[0].lower));
+    EXPECT_TRUE(std::isnan(subject.Jackknifed({kPeriods}).atPeriods[0].upper));
+}
+
 // At rate T = 1.02 about half the samples are so small that there is no such event, at 1.3 one in
 // twenty.
 TEST(MonteCarlo, DropsASampleForTheShortPeriodsThatItLacks) {
