@@ -161,13 +161,13 @@ GevProfile::Sight GevProfile::Look(double logT, double kappa) const {
         return {kNoProfile, -1, 1, 0};
     }
     const double toPath = -at.b / at.bb;
-    const double path = -at.bKappa / at.bb;
+    const double alongPath = -at.bKappa / at.bb;
     const double drift = std::abs(kappa * u) < 1e-6 ? u / 2 : (ratio - 1) / kappa;
     return {{at.value + at.b * toPath / 2, at.kappa + at.bKappa * toPath,
-             at.kappaKappa + at.bKappa * path},
+             at.kappaKappa + at.bKappa * alongPath},
             curvature < 0 ? -slope / curvature : std::copysign(1.0, slope),
             ratio,
-            (path - drift) / ratio};
+            (alongPath - drift) / ratio};
 }
 
 // Newton's method in ln |t|, in a bracket that the direction of the steps narrows. It ends where

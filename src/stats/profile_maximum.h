@@ -84,8 +84,8 @@ std::optional<Peak> PeakInside(F&& profile, Bracket bracket, double start) {
 /// over.
 class PeakSearch {
   public:
-    /// `precision` of the places of maxima.
-    explicit PeakSearch(double precision = 1e-9) : precision(precision) {}
+    /// `placePrecision` as in MaximumBetween.
+    explicit PeakSearch(double placePrecision = 1e-9) : precision(placePrecision) {}
 
     /// The highest so far; nothing when none was met.
     const std::optional<Peak>& Highest() const { return highest; }
