@@ -267,8 +267,8 @@ TEST(HardInput, DoesNotPassOverTheExponentialLimitOfATruncatedGumbel) {
     EXPECT_NEAR(gumbel->logLikelihood, exponential->logLikelihood, 1e-6);
 }
 
-// Twenty thousand values take a hundredth of a second at most; what grows with the square of the
-// sample would take minutes.
+// Twenty thousand values take hundredths of a second; what grows with the square of the sample
+// would take minutes.
 TEST(HardInput, TakesTimeInProportionToTheSample) {
     for (const double outlier : {1.0, 1e9}) {
         const Values values =
