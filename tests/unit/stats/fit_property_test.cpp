@@ -18,7 +18,6 @@
 namespace ryn::stats {
 namespace {
 
-using testing::AllNames;
 using testing::Named;
 
 const SeriesFrame kAnnual{};
@@ -291,22 +290,20 @@ RC_GTEST_PROP(Fit, ChangesInNoBitWithTheOrderOfTheSample, ()) {
     const auto values = Sample(20);
     auto reversed = values;
     std::reverse(reversed.begin(), reversed.end());
-    for (const std::string& name : AllNames()) {
-        for (const SeriesFrame& frame :
-             {kAnnual, SeriesFrame{SeriesKind::PartialDuration, 20, 2}}) {
-            const FitResult first = Fit(Named(name), {values, frame});
-            const FitResult second = Fit(Named(name), {reversed, frame});
-            RC_ASSERT(static_cast<bool>(first) == static_cast<bool>(second));
-            if (!first) {
-                RC_ASSERT(FailureText(first.Failure()) == FailureText(second.Failure()));
-                continue;
-            }
-            for (std::size_t i = 0; i < first->parameters.size(); ++i) {
-                RC_ASSERT(first->parameters[i].value == second->parameters[i].value);
-            }
-            RC_ASSERT(first->logLikelihood == second->logLikelihood ||
-                      (std::isnan(first->logLikelihood) && std::isnan(second->logLikelihood)));
+    for (const auto& [name, kind, combination] : testing::EveryCombination()) {
+        const SeriesFrame frame{kind, 20, 2};
+        const FitResult first = Fit(combination, {values, frame});
+        const FitResult second = Fit(combination, {reversed, frame});
+        RC_ASSERT(static_cast<bool>(first) == static_cast<bool>(second));
+        if (!first) {
+            RC_ASSERT(FailureText(first.Failure()) == FailureText(second.Failure()));
+            continue;
         }
+        for (std::size_t i = 0; i < first->parameters.size(); ++i) {
+            RC_ASSERT(first->parameters[i].value == second->parameters[i].value);
+        }
+        RC_ASSERT(first->logLikelihood == second->logLikelihood ||
+                  (std::isnan(first->logLikelihood) && std::isnan(second->logLikelihood)));
     }
 }
 
