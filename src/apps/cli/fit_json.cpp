@@ -23,7 +23,9 @@ Json JsonOfQuantiles(const FitReport& report) {
                         {"estimate", JsonOf(quantile.estimate)},
                         {"average", JsonOf(quantile.average)},
                         {"standardDeviation", JsonOf(quantile.standardDeviation)},
-                        {"bias", JsonOf(quantile.bias)}});
+                        {"bias", JsonOf(quantile.bias)},
+                        {"lower", JsonOf(quantile.lower)},
+                        {"upper", JsonOf(quantile.upper)}});
     }
     return list;
 }

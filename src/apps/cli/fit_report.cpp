@@ -103,6 +103,8 @@ std::vector<std::string> QuantileHeading(const FitReport& report) {
     if (report.uncertainty != FitUncertainty::None)
         for (const int id : {kTextCliAverage, kTextCliStandardDeviation, kTextCliBias})
             row.push_back(TextOf(id));
+    if (report.uncertainty == FitUncertainty::MonteCarlo)
+        row.insert(row.end(), {"2.5 %", "97.5 %"});
     return row;
 }
 
@@ -116,12 +118,12 @@ void PrintQuantiles(std::ostream& out, const FitReport& report) {
     for (std::size_t i = 0; i < report.periods.size(); ++i) {
         const stats::ResampledQuantile& quantile = report.quantiles.atPeriods[i];
         // The table drops what it has no column for.
-        table.AddRow({ShortestText(report.periods[i]),
-                      NumberText(report.exceedances[i], probabilityDecimals),
-                      NumberText(quantile.estimate, decimals),
-                      NumberText(quantile.average, decimals),
-                      NumberText(quantile.standardDeviation, decimals),
-                      NumberText(quantile.bias, decimals)});
+        table.AddRow(
+            {ShortestText(report.periods[i]),
+             NumberText(report.exceedances[i], probabilityDecimals),
+             NumberText(quantile.estimate, decimals), NumberText(quantile.average, decimals),
+             NumberText(quantile.standardDeviation, decimals), NumberText(quantile.bias, decimals),
+             NumberText(quantile.lower, decimals), NumberText(quantile.upper, decimals)});
     }
     table.Print(out);
 }

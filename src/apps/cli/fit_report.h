@@ -41,8 +41,9 @@ struct FitReport {
 
 /// Members: name, n, unit, failed (null or the reason), parameters (symbol, estimate),
 /// logLikelihood, quantiles (period, probability of exceedance, estimate, average,
-/// standardDeviation, bias; the last three are null without uncertainty), goodness, uncertainty
-/// (method, resamples, failed), sampleCorrection.
+/// standardDeviation, bias, which are null without uncertainty, lower and upper, the ends of the
+/// 95 % percentile interval of Monte Carlo and else null), goodness, uncertainty (method,
+/// resamples, failed), sampleCorrection.
 Json JsonOfFit(const FitReport& report);
 
 /// A heading, parameters, goodness of fit and quantiles; of a failure the reason.

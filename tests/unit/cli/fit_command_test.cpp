@@ -47,7 +47,7 @@ TEST_F(FitCommand, FitsAColumnOfNumbers) {
     EXPECT_NEAR(fit["parameters"][1]["estimate"], kAlpha, 1e-12);
     const auto quantile = fit["quantiles"][1];
     EXPECT_THAT(KeysOf(quantile), ElementsAre("period", "probability", "estimate", "average",
-                                              "standardDeviation", "bias"));
+                                              "standardDeviation", "bias", "lower", "upper"));
     EXPECT_EQ(quantile["period"], 1000.0);
     EXPECT_EQ(quantile["probability"], 0.001);
     EXPECT_NEAR(quantile["estimate"], kXi - kAlpha * std::log(-std::log1p(-0.001)), 1e-9);
@@ -160,6 +160,8 @@ TEST_F(FitCommand, EstimatesTheUncertaintyThatIsAskedFor) {
     const auto simulated = Json()["quantiles"][0];
     EXPECT_NEAR(simulated["bias"],
                 simulated["average"].get<double>() - simulated["estimate"].get<double>(), 1e-10);
+    EXPECT_LT(simulated["lower"], simulated["estimate"]);
+    EXPECT_GT(simulated["upper"], simulated["estimate"]);
     EXPECT_EQ(Json()["uncertainty"]["resamples"], 1000);
     ASSERT_EQ(Run(with("none"), kPeaks), 0) << err;
     EXPECT_TRUE(Json()["quantiles"][0]["average"].is_null());
