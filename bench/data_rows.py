@@ -1,0 +1,30 @@
+"""Rows of reading and selecting series, and of parameter trees; elapsed time."""
+import benchmarks
+
+REPETITIONS = 7
+MILLION = 1_000_000
+TEN = 10 * MILLION
+
+
+def add(table, program):
+    found = benchmarks.medians(program, "^(Netcdf|Read|Annual|Partial|Kvf)", REPETITIONS)
+
+    def time(name, size):
+        return found[f"{name}/{size}"]["real_time"]
+
+    read = time("ReadSeries", TEN)
+    table.add("read 10^7 samples / netCDF alone", read / time("NetcdfAlone", TEN), at_most=2.5)
+    for name, text in [("AnnualMaximaOfYears", "annual maxima"),
+                       ("AnnualMaximaOfSeasons", "annual maxima of a season"),
+                       ("PartialDurationsOfAllYear", "partial durations"),
+                       ("PartialDurationsOfSeasons", "partial durations of a season")]:
+        table.add(f"{text} of 10^7 samples / reading them", time(name, TEN) / read, at_most=1)
+    table.add("bytes of memory a sample", found[f"ReadSeries/{TEN}"]["bytesPerSample"], at_most=48)
+    # Arrays of 3 x 10^6 samples and more come fresh from the system; smaller ones are used again.
+    for name, text in [("ReadSeries", "read"), ("AnnualMaximaOfYears", "annual maxima of"),
+                       ("PartialDurationsOfAllYear", "partial durations of")]:
+        table.add(f"{text} 10^7 / 3 x 10^6 samples (in proportion: 3.33)",
+                  time(name, TEN) / time(name, 3 * MILLION))
+    for name, text in [("KvfWrite", "write"), ("KvfRead", "read"), ("KvfLookUpAll", "look up")]:
+        table.add(f"{text} a tree of 10^6 / 10^5 keywords (in proportion: 10)",
+                  time(name, MILLION) / time(name, MILLION // 10))
