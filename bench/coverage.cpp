@@ -52,13 +52,31 @@ struct Subject {
     bool HasLimits() const { return std::abs(kappa) <= 0.1; }
 };
 
+/// Of the intervals of many series.
 struct Coverage {
     std::size_t covered = 0;
+    std::size_t above = 0;           ///< the true event is higher than the interval
     std::size_t withoutInterval = 0; ///< not fitted, or no deviation; counts as not covered
 
-    double Percent() const { return 100.0 * static_cast<double>(covered) / kSeries; }
+    double Percent() const { return PercentOf(covered); }
+    double PercentAbove() const { return PercentOf(above); }
     double StandardError() const { return std::sqrt(Percent() * (100 - Percent()) / kSeries); }
     bool Within() const { return Percent() >= kLeast && Percent() <= kMost; }
+
+    void Note(const std::optional<ResampledQuantile>& reported, double truth) {
+        if (!reported || !std::isfinite(reported->standardDeviation)) {
+            ++withoutInterval;
+        } else if (truth > reported->estimate + reported->standardDeviation) {
+            ++above;
+        } else if (truth >= reported->estimate - reported->standardDeviation) {
+            ++covered;
+        }
+    }
+
+  private:
+    static double PercentOf(std::size_t count) {
+        return 100.0 * static_cast<double>(count) / kSeries;
+    }
 };
 
 Combination LMomentsOf(DistributionType distribution) {
@@ -125,19 +143,14 @@ Coverage CoverageOf(const Subject& subject) {
     const double truth = subject.Truth();
     Coverage coverage;
     for (std::size_t i = 0; i < kSeries; ++i) {
-        const auto reported = Reported(subject.combination, Simulated(subject, draws));
-        if (!reported || !std::isfinite(reported->standardDeviation)) {
-            ++coverage.withoutInterval;
-        } else if (std::abs(reported->estimate - truth) <= reported->standardDeviation) {
-            ++coverage.covered;
-        }
+        coverage.Note(Reported(subject.combination, Simulated(subject, draws)), truth);
     }
     return coverage;
 }
 
 void PrintHeader() {
-    fmt::print("{:<30} {:>5} {:>10} {:>10} {:>11}   {}\n", "family", "kappa", "coverage %",
-               "std. error", "no interval", "required %");
+    fmt::print("{:<30} {:>5} {:>10} {:>10} {:>10} {:>11}   {}\n", "family", "kappa", "coverage %",
+               "std. error", "true above", "no interval", "required %");
 }
 
 void PrintRow(const Subject& subject, const Coverage& coverage) {
@@ -146,8 +159,9 @@ void PrintRow(const Subject& subject, const Coverage& coverage) {
         required =
             fmt::format("{:g} to {:g}{}", kLeast, kMost, coverage.Within() ? "" : "  MISSED");
     }
-    fmt::print("{:<30} {:>5.1f} {:>10.1f} {:>10.1f} {:>11}   {}\n", subject.family, subject.kappa,
-               coverage.Percent(), coverage.StandardError(), coverage.withoutInterval, required);
+    fmt::print("{:<30} {:>5.1f} {:>10.1f} {:>10.1f} {:>10.1f} {:>11}   {}\n", subject.family,
+               subject.kappa, coverage.Percent(), coverage.StandardError(), coverage.PercentAbove(),
+               coverage.withoutInterval, required);
     std::fflush(stdout);
 }
 

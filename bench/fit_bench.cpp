@@ -16,7 +16,7 @@ namespace {
 void FitOf(benchmark::State& state, const NamedCombination& named) {
     const Sample sample = DrawnSample(named.kind, static_cast<std::size_t>(state.range(0)));
     FitScratch scratch;
-    for (auto _ : state) {
+    for ([[maybe_unused]] auto _ : state) {
         const FitResult fit = Fit(named.combination, {sample.values, sample.frame}, scratch);
         if (!fit) {
             state.SkipWithError(FailureText(fit.Failure()).c_str());
@@ -32,7 +32,7 @@ void JackknifeOf(benchmark::State& state, const NamedCombination& named) {
     const Sample sample = DrawnSample(named.kind, static_cast<std::size_t>(state.range(0)));
     const FitInput input{sample.values, sample.frame};
     const FitResult fit = Fit(named.combination, input);
-    for (auto _ : state) {
+    for ([[maybe_unused]] auto _ : state) {
         benchmark::DoNotOptimize(
             Jackknife(named.combination, fit->distribution, input, {.periods = periods}));
     }

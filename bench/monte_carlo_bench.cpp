@@ -50,7 +50,7 @@ class Pass {
 
 void MonteCarloOf(benchmark::State& state, const NamedCombination& named) {
     const Pass pass(named);
-    for (auto _ : state) {
+    for ([[maybe_unused]] auto _ : state) {
         benchmark::DoNotOptimize(pass.Run());
     }
 }
@@ -60,7 +60,7 @@ void MonteCarloOfAnnualMaxima(benchmark::State& state) {
     for (const NamedCombination& named : AnnualMaximumCombinations()) {
         passes.emplace_back(named);
     }
-    for (auto _ : state) {
+    for ([[maybe_unused]] auto _ : state) {
         for (const Pass& pass : passes) {
             benchmark::DoNotOptimize(pass.Run());
         }

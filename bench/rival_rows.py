@@ -10,10 +10,10 @@ SERIES = BENCH.parent / "tests/reference/stats/series/portpirie.txt"
 COUNT = 50
 REPETITIONS = 7
 REPLICATES = 1000
-SAME_SHAPE = 1e-4  # the rivals' optimisers stop there
+SAME_SHAPE = 1e-4  # about where the rivals' optimisers stop
 
-R = ["Rscript", "--vanilla"]
-# Debian's own interpreter: another one before it in PATH would not know Debian's SciPy.
+# Debian's own interpreters: others that stand before them in PATH would not know its packages.
+R = ["/usr/bin/Rscript", "--vanilla"]
 PYTHON = ["/usr/bin/python3"]
 
 

@@ -32,7 +32,7 @@ void GevLikelihoodFit(benchmark::State& state) {
     const Combination combination = GevBy(EstimationMethod::MaximumLikelihood);
     const Sample sample = RealSample(SeriesKind::AnnualMaximum, kCount);
     FitScratch scratch;
-    for (auto _ : state) {
+    for ([[maybe_unused]] auto _ : state) {
         benchmark::DoNotOptimize(Fit(combination, {sample.values, sample.frame}, scratch));
     }
     TellShape(state, Fit(combination, {sample.values, sample.frame}));
@@ -44,7 +44,7 @@ void GevReplicates(benchmark::State& state, EstimationMethod method) {
     const Sample sample = RealSample(SeriesKind::AnnualMaximum, kCount);
     const FitResult fit = Fit(combination, {sample.values, sample.frame});
     const MonteCarloSubject subject{combination, fit->distribution, kCount, sample.frame};
-    for (auto _ : state) {
+    for ([[maybe_unused]] auto _ : state) {
         benchmark::DoNotOptimize(MonteCarlo(subject, {.periods = kPeriod}));
     }
     TellShape(state, fit);
