@@ -8,13 +8,19 @@ TEN = 10 * MILLION
 
 
 def add(table, program):
-    found = benchmarks.medians(program, "^(Netcdf|Read|Annual|Partial|Kvf)", REPETITIONS)
+    # In a process of their own: the memory that others leave behind moves the library's time by a
+    # quarter, one way in one run and the other way in the next.
+    alone = benchmarks.medians(program, f"^(NetcdfAlone|ReadSeries)/{TEN}$", REPETITIONS)
+    table.add("read 10^7 samples / netCDF alone",
+              alone[f"ReadSeries/{TEN}"]["cpu_time"] / alone[f"NetcdfAlone/{TEN}"]["cpu_time"],
+              at_most=2.5)
+
+    found = benchmarks.medians(program, "^(Read|Annual|Partial|Kvf)", REPETITIONS)
 
     def time(name, size):
         return found[f"{name}/{size}"]["cpu_time"]
 
     read = time("ReadSeries", TEN)
-    table.add("read 10^7 samples / netCDF alone", read / time("NetcdfAlone", TEN), at_most=2.5)
     for name, text in [("AnnualMaximaOfYears", "annual maxima"),
                        ("AnnualMaximaOfSeasons", "annual maxima of a season"),
                        ("PartialDurationsOfAllYear", "partial durations"),

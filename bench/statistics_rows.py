@@ -26,7 +26,7 @@ def add(table, program):
         proportion = f"(in proportion: {large // small})"
         table.add(f"{text} {large} / {small} values, median of {len(ratios)} {proportion}",
                   statistics.median(ratio for ratio, _ in ratios))
-        table.add(f"{text} {large} / {small} values, {name} {proportion}", worst)
+        table.add(f"{text} {large} / {small} values, most: {name} {proportion}", worst)
 
 
 def print_monte_carlo(program):
