@@ -5,6 +5,8 @@
 # make lint      formatting, clang-tidy, the order of the folders
 # make bench     the speed table, beside R and SciPy (installed where they are missing)
 # make coverage  how often the reported deviation holds the true 100-year event (two minutes)
+# make validation  every fit against the same fit in R; rewrites its tables in docs/methods.md.
+#                  PUBLISHED=DIR adds reference_fits.csv of that directory, with its series
 # make fuzz      each fuzz target for FUZZ_SECONDS seconds (default 600)
 
 JOBS ?= $(shell nproc)
@@ -14,7 +16,7 @@ FUZZ_SECONDS ?= 600
 export CCACHE_BASEDIR := $(CURDIR)
 export CCACHE_NOHASHDIR := 1
 
-.PHONY: run test build sanitize lint bench coverage fuzz format packages clean
+.PHONY: run test build sanitize lint bench coverage validation fuzz format packages clean
 .DEFAULT_GOAL := build
 
 packages:
@@ -49,6 +51,11 @@ bench: build
 
 coverage: build
 	build/release/bin/ryn_coverage
+
+validation: build
+	@tools/install-packages tools/validation/packages.txt
+	PYTHONDONTWRITEBYTECODE=1 tools/validation/validate.py build/release/bin/ryn --docs docs/methods.md \
+		--out build/validation/fits.csv $(if $(PUBLISHED),--published $(PUBLISHED))
 
 fuzz: build/fuzz/build.ninja
 	cmake --build build/fuzz -j $(JOBS)

@@ -17,6 +17,7 @@ MAY_USE = {
     "netcdf": {"base"},
     "axes": {"base"},
     "stats": set(),
+    "selfcheck": {"base", "stats"},
     "ports": {"base", "strings"},
     "framework": {"base", "strings", "kvf", "ports"},
     "tsq": {"base", "units", "netcdf"},
@@ -34,10 +35,10 @@ MAY_USE = {
     "views": {"results", "document", "axes", "desktop", "widgets"},
     "forms": {"run", "params", "desktop", "widgets"},
     "shell": {"views", "forms", "run"},
-    "apps": {"run", "import", "stats"},
+    "apps": {"run", "import", "stats", "selfcheck"},
 }
 LEVEL_TWO_AND_UP = set(MAY_USE) - {
-    "base", "strings", "units", "kvf", "netcdf", "axes", "stats", "ports",
+    "base", "strings", "units", "kvf", "netcdf", "axes", "stats", "selfcheck", "ports",
 }
 # What only one folder may call.
 PRIVATE_HEADERS = {

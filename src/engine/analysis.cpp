@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
+#include <numeric>
 
 #include "stats/jackknife.h"
 #include "stats/monte_carlo.h"
@@ -29,8 +30,11 @@ void MakeFiniteOrNaN(std::vector<double>& values) {
 
 void MakeFiniteOrNaN(std::vector<ResampledQuantile>& quantiles) {
     for (ResampledQuantile& quantile : quantiles)
-        quantile = {FiniteOrNaN(quantile.estimate), FiniteOrNaN(quantile.average),
-                    FiniteOrNaN(quantile.standardDeviation), FiniteOrNaN(quantile.bias)};
+        for (double ResampledQuantile::*const member :
+             {&ResampledQuantile::estimate, &ResampledQuantile::average,
+              &ResampledQuantile::standardDeviation, &ResampledQuantile::bias,
+              &ResampledQuantile::lower, &ResampledQuantile::upper})
+            quantile.*member = FiniteOrNaN(quantile.*member);
 }
 
 // In time order: all but the last depend on it.
@@ -41,6 +45,17 @@ void RunTests(const EngineInput& input, SeriesResults& series) {
         series.trend = stats::TrendTestOf(input.values);
     if (input.tests.shift)
         series.shift = stats::ShiftTestOf(input.values, input.sampleNumbers);
+}
+
+// Equal values in the order in which they were observed.
+void Sort(const EngineInput& input, SeriesResults& series) {
+    series.places.resize(input.values.size());
+    std::iota(series.places.begin(), series.places.end(), std::size_t{1});
+    std::stable_sort(series.places.begin(), series.places.end(), [&](std::size_t a, std::size_t b) {
+        return input.values[a - 1] < input.values[b - 1];
+    });
+    for (const std::size_t place : series.places)
+        series.ascending.push_back(input.values[place - 1]);
 }
 
 // One longer than all time has an event only where the distribution has an upper bound, and one
@@ -78,6 +93,11 @@ ResampledQuantiles EstimatesAlone(const stats::Distribution& fitted, const Serie
     return quantiles;
 }
 
+// Sorted once for all combinations.
+stats::FitInput Ascending(const EngineInput& input, const SeriesResults& series) {
+    return {series.ascending, input.frame, stats::ValueOrder::Ascending};
+}
+
 // In one pass for table and curves: the resamples are the same, and refitting them is nearly all of
 // the time.
 ResampledQuantiles Quantiles(const EngineInput& input, const SeriesResults& series,
@@ -89,7 +109,7 @@ ResampledQuantiles Quantiles(const EngineInput& input, const SeriesResults& seri
     case UncertaintyMethod::MonteCarlo:
         return stats::MonteCarlo({combination, fitted, input.values.size(), input.frame}, requests);
     case UncertaintyMethod::Jackknife:
-        return stats::Jackknife(combination, fitted, {input.values, input.frame}, requests);
+        return stats::Jackknife(combination, fitted, Ascending(input, series), requests);
     case UncertaintyMethod::None:
         break;
     }
@@ -156,8 +176,7 @@ std::optional<SeriesResults> AnalyseSeries(const EngineInput& input) {
     SeriesResults series;
     series.histogram = std::move(*histogram);
     series.statistics = stats::SampleStatisticsOf(input.values);
-    series.ascending = input.values;
-    stats::SortAscending(series.ascending);
+    Sort(input, series);
     RunTests(input, series);
     FindEvents(input, series);
     series.curveAbscissae = stats::DensityCurveAbscissae(series.histogram, input.frame.kind);
@@ -172,7 +191,7 @@ CombinationAnalysis AnalyseCombination(const EngineInput& input, const SeriesRes
     const stats::Combination& asked = combination.combination;
     CombinationAnalysis analysis{{combination.name,
                                   stats::EstimatedSymbols(asked, input.frame.kind),
-                                  stats::Fit(asked, {input.values, input.frame}),
+                                  stats::Fit(asked, Ascending(input, series)),
                                   {},
                                   {},
                                   {},

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <optional>
 #include <string>
 #include <vector>
@@ -22,7 +23,8 @@ struct SeriesResults {
     std::optional<stats::TrendTest> trend;
     std::optional<stats::ShiftTest> shift;
     stats::Histogram histogram;
-    std::vector<double> ascending; ///< the values
+    std::vector<double> ascending;   ///< the values
+    std::vector<std::size_t> places; ///< in the series, from 1, of each of them
     /// The return periods asked for, with NaN in the place of one that has no event: not finite, or
     /// no longer than the shortest, which an event recurs in for certain.
     std::vector<double> periods;

@@ -104,7 +104,7 @@ std::vector<CombinationResults> EngineRun::AnalyseAll(const EngineInput& input,
         Tell(LabelOf(input.combinations[i], i), series, analysis.results);
         // Written one by one, and the plot with its n ranks dropped then: a report of thirty
         // combinations is larger than all else in memory.
-        goodness.Write(GoodnessReportOf(input, i, analysis));
+        goodness.Write(GoodnessReportOf(input, i, series, analysis));
         quantiles.Write(QuantileReportOf(input, i, series, analysis.results));
         combinations.push_back(std::move(analysis.results));
     }

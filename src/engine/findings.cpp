@@ -13,8 +13,8 @@ namespace {
 using stats::ResampledQuantile;
 using stats::ResampledQuantiles;
 
-template <typename Test>
 // The result tree has no place for the reason.
+template <typename Test>
 void AddObstacle(Sentences& warnings, const char* name, const std::optional<Test>& test) {
     if (test && !test->score.IsMade())
         warnings.push_back(std::string(name) + " not made: " +

@@ -146,15 +146,16 @@ void AppendMeasures(std::string& text, const FitMeasureRequests& asked,
 
 // The numbers behind the probability plot, for users who draw their own.
 void AppendPlot(std::string& text, const stats::Distribution& fitted,
-                const stats::ProbabilityPlot& plot) {
+                const stats::ProbabilityPlot& plot, const std::vector<std::size_t>& places) {
     text +=
-        "\nObservations x and fitted quantiles; p is the plotting position, as non-exceedance\n";
-    AppendRow(text, {"rank", "x", "p", "F(x)", "quantile of p", "difference"});
+        "\nObservations x and fitted quantiles; p is the plotting position, as non-exceedance,\n"
+        "and the place is that in the series, in order of time\n";
+    AppendRow(text, {"rank", "place", "x", "p", "F(x)", "quantile of p", "difference"});
     for (std::size_t i = 0; i < plot.observed.size(); ++i) {
         const double x = plot.observed[i];
-        AppendRow(text, {std::to_string(i + 1), SixDigits(x), SixDigits(plot.positions[i]),
-                         SixDigits(stats::Cdf(fitted, x)), SixDigits(plot.quantiles[i]),
-                         SixDigits(x - plot.quantiles[i])});
+        AppendRow(text, {std::to_string(i + 1), std::to_string(places[i]), SixDigits(x),
+                         SixDigits(plot.positions[i]), SixDigits(stats::Cdf(fitted, x)),
+                         SixDigits(plot.quantiles[i]), SixDigits(x - plot.quantiles[i])});
     }
 }
 
@@ -174,13 +175,13 @@ std::string GoodnessReportHead(const EngineInput& input, const SeriesResults& se
 }
 
 std::string GoodnessReportOf(const EngineInput& input, std::size_t index,
-                             const CombinationAnalysis& analysis) {
+                             const SeriesResults& series, const CombinationAnalysis& analysis) {
     const CombinationResults& results = analysis.results;
     std::string text = CombinationHead(input, index, results);
     if (!results.fit)
         return text;
     AppendMeasures(text, input.measures, results);
-    AppendPlot(text, results.fit->distribution, analysis.plot);
+    AppendPlot(text, results.fit->distribution, analysis.plot, series.places);
     return text;
 }
 

@@ -13,8 +13,8 @@ constexpr const char* kGoodnessReportSubject = "Goodness of fit";
 std::string GoodnessReportHead(const EngineInput& input, const SeriesResults& series);
 
 /// The measures that were asked for with what they were made of, and the observations by ascending
-/// rank beside the fitted quantiles.
+/// rank beside the fitted quantiles, each with its place in the series.
 std::string GoodnessReportOf(const EngineInput& input, std::size_t index,
-                             const CombinationAnalysis& analysis);
+                             const SeriesResults& series, const CombinationAnalysis& analysis);
 
 } // namespace ryn

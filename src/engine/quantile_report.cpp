@@ -42,6 +42,16 @@ void AppendQuantile(std::string& text, double period, double exceedance,
                      SixDigits(quantile.estimate + margin)});
 }
 
+// A heavy tail's resamples reach much further up than down, which no symmetric bounds show.
+void AppendPercentiles(std::string& text, const std::vector<double>& periods,
+                       const std::vector<stats::ResampledQuantile>& quantiles) {
+    text += "\nPercentile intervals: 95 % of the resampled quantiles lie between the bounds\n";
+    AppendRow(text, {"T", "lower", "estimate", "upper"});
+    for (std::size_t i = 0; i < periods.size(); ++i)
+        AppendRow(text, {PeriodText(periods[i]), SixDigits(quantiles[i].lower),
+                         SixDigits(quantiles[i].estimate), SixDigits(quantiles[i].upper)});
+}
+
 // Many failures make the deviation that of the milder samples.
 void AppendResamples(std::string& text, UncertaintyMethod method,
                      const stats::ResampledQuantiles& quantiles) {
@@ -77,6 +87,8 @@ std::string QuantileReportOf(const EngineInput& input, std::size_t index,
     for (std::size_t i = 0; i < input.periods.size(); ++i)
         AppendQuantile(text, input.periods[i], series.exceedances[i],
                        results.quantiles.atPeriods[i]);
+    if (input.uncertainty == UncertaintyMethod::MonteCarlo && !input.periods.empty())
+        AppendPercentiles(text, input.periods, results.quantiles.atPeriods);
     AppendResamples(text, input.uncertainty, results.quantiles);
     return text;
 }

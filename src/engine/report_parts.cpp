@@ -3,18 +3,17 @@
 #include "engine/input_summary.h"
 #include "engine/plain_text.h"
 #include "engine/report_text.h"
+#include "engine/shape_note.h"
 
 namespace ryn {
 
 namespace {
 
-// Half of the literature writes the shape with the other sign.
 constexpr std::string_view kReadingNotes =
     "\"-\" stands for a number that does not exist. xi is a location or lower bound, alpha a "
     "scale\n"
-    "and kappa a shape (log-normal: mu and sigma of the logarithms). The shape of the generalised\n"
-    "extreme value and generalised Pareto distributions has Hosking's sign: kappa > 0 means an\n"
-    "upper bound, kappa < 0 a heavy tail (the shape in Coles (2001) is -kappa).\n";
+    "and kappa a shape, whose sign and tail are told with each fit (log-normal: mu and sigma of "
+    "the\nlogarithms; square-root exponential: exp(-a) is the probability of 0, b a scale).\n";
 
 // No date: two runs over the same tree give the same report.
 std::string Title(std::string_view subject, const EngineInput& input) {
@@ -32,6 +31,8 @@ void AppendParameters(std::string& text, const stats::FittedModel& model) {
     for (const stats::Parameter& parameter : stats::Parameters(model.distribution))
         AppendValue(text, std::string(parameter.symbol) + (parameter.estimated ? "" : " (given)"),
                     SixDigits(parameter.value));
+    if (const std::string note = ShapeNote(model.distribution); !note.empty())
+        text += "  " + note + "\n";
 }
 
 } // namespace

@@ -18,7 +18,7 @@ namespace ryn::stats {
 
 namespace {
 
-constexpr FitFailure kNotAvailable{FitFault::NotAvailable};
+constexpr FitFailure kNotOffered{FitFault::MethodNotOffered};
 
 // Every estimator gives its own family; here they become one type.
 template <class D>
@@ -35,7 +35,7 @@ std::optional<FitFailure> Refusal(const Combination& c, SeriesKind kind, std::si
     case Offer::DistributionNotOffered:
         return FitFailure{FitFault::DistributionNotOffered, {}, kind};
     case Offer::MethodNotOffered:
-        return FitFailure{FitFault::MethodNotOffered};
+        return kNotOffered;
     case Offer::Offered:
         break;
     }
@@ -153,7 +153,7 @@ Outcome<Estimate> ByMoments(const Combination& c, const SeriesFrame& frame,
         return AsEstimate(fixed ? ExponentialAbove(frame.threshold, moments.mean)
                                 : ExponentialFromMoments(moments));
     default:
-        return kNotAvailable;
+        return kNotOffered;
     }
 }
 
@@ -182,7 +182,7 @@ Outcome<Estimate> ByLMoments(const Combination& c, const SeriesFrame& frame,
         return AsEstimate(fixed ? ExponentialAbove(frame.threshold, moments.l1)
                                 : ExponentialFromLMoments(moments));
     default:
-        return kNotAvailable;
+        return kNotOffered;
     }
 }
 

@@ -46,7 +46,7 @@ EstimationBasis BasisOf(const Combination& combination);
 
 /// Estimates the parameters and checks nothing but the parameters: the step that resampling
 /// repeats, since there an estimate that leaves values outside its support still counts.
-/// Failures: DistributionNotOffered, MethodNotOffered, NotAvailable, TooFewValues, those of the
+/// Failures: DistributionNotOffered, MethodNotOffered, TooFewValues, those of the
 /// method, InvalidParameters.
 Outcome<Estimate> EstimateParameters(const Combination& combination, const FitInput& input,
                                      FitScratch& scratch);

@@ -4,6 +4,7 @@
 #include <cmath>
 #include <cstddef>
 #include <limits>
+#include <vector>
 
 namespace ryn::stats {
 
@@ -44,7 +45,16 @@ Agreement Compare(const D& d, const FitInput& input) {
 
 } // namespace
 
-FitResult Fit(const Combination& combination, const FitInput& input, FitScratch& scratch) {
+// Sums over the ascending values: the order in which a series was observed shows in no bit of a
+// fit, and the small values are added first.
+FitResult Fit(const Combination& combination, const FitInput& given, FitScratch& scratch) {
+    std::vector<double> sorted;
+    FitInput input = given;
+    if (given.order == ValueOrder::AsObserved) {
+        sorted.assign(given.values.begin(), given.values.end());
+        SortAscending(sorted);
+        input = {sorted, given.frame, ValueOrder::Ascending};
+    }
     const auto estimate = EstimateParameters(combination, input, scratch);
     if (!estimate) {
         return estimate.Failure();

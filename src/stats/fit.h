@@ -27,6 +27,8 @@ using FitResult = Outcome<FittedModel>;
 /// In a partial duration series a value below the threshold by no more than
 /// 1e-6 max(1, |threshold|) counts as equal to it, since values that were stored with seven digits
 /// fall short of a threshold that was not.
+///
+/// Permuting the values changes no bit of the result.
 FitResult Fit(const Combination& combination, const FitInput& input, FitScratch& scratch);
 
 /// The same without buffers to keep.

@@ -33,9 +33,6 @@ std::string NotOffered(SeriesKind kind) {
 } // namespace
 
 std::string FailureCode(const FitFailure& failure) {
-    if (failure.fault == FitFault::NotAvailable) {
-        return {};
-    }
     const int number = static_cast<int>(failure.fault);
     return (number < 10 ? "C0" : "C") + std::to_string(number);
 }
@@ -75,11 +72,9 @@ std::string FailureText(const FitFailure& failure) {
     case FitFault::InvalidParameters:
         return "parameters are not valid";
     case FitFault::MeanExceedanceNotPositive:
-        return "mean exceedance is not positive";
-    case FitFault::NotAvailable:
         break;
     }
-    return "this combination is not available in this version";
+    return "mean exceedance is not positive";
 }
 
 std::string WarningCode(const FitWarning& warning) {

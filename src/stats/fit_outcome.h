@@ -30,20 +30,19 @@ enum class FitFault {
     ValuesOutsideSupport = 13,
     InvalidParameters = 14,
     MeanExceedanceNotPositive = 15,
-    NotAvailable = 16, ///< offered, but not part of this version
 };
 
 /// A failure as a value: the text is made when somebody asks for it, since resampling drops
 /// failures by the hundred without reading them.
 struct FitFailure {
-    FitFault fault = FitFault::NotAvailable;
+    FitFault fault = FitFault::MethodNotOffered;
     /// The numbers of the text in their order: sample skewness; L-Cv and L-skewness; count and
     /// smallest count; lower bound and smallest value.
     std::array<double, 2> numbers{};
     SeriesKind kind = SeriesKind::AnnualMaximum; ///< for DistributionNotOffered
 };
 
-/// "C01" to "C15"; empty for NotAvailable, which has no code.
+/// "C01" to "C15".
 std::string FailureCode(const FitFailure& failure);
 
 /// One line for the log, without code and full stop. Numbers have a decimal point in any locale.

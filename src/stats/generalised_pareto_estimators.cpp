@@ -58,7 +58,7 @@ Outcome<GeneralisedPareto> ParetoAboveFromLMoments(double threshold, const LMome
         return FitFailure{FitFault::MeanExceedanceNotPositive};
     }
     const double lCv = moments.l2 / mean;
-    if (!(lCv > 0 && lCv < 1)) {
+    if (!IsLCv(lCv)) {
         return LMomentsOutOfRange(lCv, moments.LSkewness());
     }
     const double kappa = 1 / lCv - 2;

@@ -1,9 +1,11 @@
 #include "stats/gev_profile.h"
 
+#include "stats/pair.h"
 #include "stats/shape_functions.h"
 
 #include <algorithm>
 #include <cmath>
+#include <cstddef>
 #include <limits>
 
 namespace ryn::stats {
@@ -11,21 +13,24 @@ namespace ryn::stats {
 namespace {
 
 // t(u, kappa) with its derivatives. In ln u: r = u/q with q = 1 - kappa u, then u/q^2 and, mixed
-// with kappa, r^2. In kappa: k and kk.
+// with kappa, r^2. In kappa: k and kk. N is a number or a pair of them.
+template <class N>
 struct Transformed {
-    double t;
-    double q;
-    double r;
-    double k;
-    double kk;
+    N t;
+    N r;
+    N slopeOfR;
+    N k;
+    N kk;
 };
 
-Transformed Directly(double u, double kappa, double inverse) {
-    const double q = 1 - kappa * u;
-    const double r = u / q;
-    const double t = -std::log(q) * inverse;
-    const double k = (r - t) * inverse;
-    return {t, q, r, k, (r * r - 2 * k) * inverse};
+template <class N>
+Transformed<N> Directly(const N& u, double kappa, double inverse) {
+    using std::log;
+    const N inverseQ = 1.0 / (1.0 - kappa * u);
+    const N r = u * inverseQ;
+    const N t = log(inverseQ) * inverse;
+    const N k = (r - t) * inverse;
+    return {t, r, r * inverseQ, k, (r * r - 2.0 * k) * inverse};
 }
 
 // The direct forms divide small differences by kappa; from |kappa| = 1e-3 on, what they lose around
@@ -35,7 +40,7 @@ Transformed Directly(double u, double kappa, double inverse) {
 constexpr double kSeriesShapes = 1e-3;
 constexpr double kSeriesRange = 0.02;
 
-Transformed BySeries(double u, double h) {
+Transformed<double> BySeries(double u, double h) {
     double t = 0;
     double k = 0;
     double kk = 0;
@@ -44,29 +49,31 @@ Transformed BySeries(double u, double h) {
         k = k * h + (j + 1.0) / (j + 2);
         kk = kk * h + (j + 1.0) * (j + 2) / (j + 3);
     }
-    return {u * t, 1 - h, u / (1 - h), u * u * k, u * u * u * kk};
+    const double r = u / (1 - h);
+    return {u * t, r, r / (1 - h), u * u * k, u * u * u * kk};
 }
 
-Transformed Transform(double u, double kappa) {
+Transformed<double> Transform(double u, double kappa) {
     const double h = kappa * u;
     const bool bySeries = std::abs(kappa) < kSeriesShapes && std::abs(h) < kSeriesRange;
     return bySeries ? BySeries(u, h) : Directly(u, kappa, 1 / kappa);
 }
 
-// Sums over the sample, plain and with the weights w = exp(-t).
+// Sums over the sample, plain and with the weights w = exp(leastT - t).
+template <class N>
 struct Sums {
-    double w = 0, wr = 0, wrr = 0, wrb = 0, wk = 0, wkk = 0, wrk = 0, wCurve = 0;
-    double t = 0, r = 0, rr = 0, rb = 0, k = 0, curve = 0;
+    N w{0}, wr{0}, wrr{0}, wrb{0}, wk{0}, wkk{0}, wrk{0}, wCurve{0};
+    N t{0}, r{0}, rr{0}, rb{0}, k{0}, curve{0};
 
-    void Add(const Transformed& at) {
-        const double weight = std::exp(-at.t);
-        const double rWeighted = weight * at.r;
-        const double kWeighted = weight * at.k;
-        const double slopeOfR = at.r / at.q;
+    void Add(const Transformed<N>& at, double leastT) {
+        using std::exp;
+        const N weight = exp(leastT - at.t);
+        const N rWeighted = weight * at.r;
+        const N kWeighted = weight * at.k;
         w += weight;
         wr += rWeighted;
         wrr += rWeighted * at.r;
-        wrb += weight * slopeOfR;
+        wrb += weight * at.slopeOfR;
         wk += kWeighted;
         wkk += kWeighted * at.k;
         wrk += rWeighted * at.k;
@@ -74,47 +81,54 @@ struct Sums {
         t += at.t;
         r += at.r;
         rr += at.r * at.r;
-        rb += slopeOfR;
+        rb += at.slopeOfR;
         k += at.k;
         curve += at.kk;
     }
 };
 
-// Two loops, since all the time of a fit goes here.
-Sums SumsOver(std::span<const double> deviations, double b, double kappa) {
-    Sums sums;
-    if (std::abs(kappa) < kSeriesShapes) {
-        for (const double d : deviations) {
-            sums.Add(Transform(b * d, kappa));
-        }
-    } else {
+Sums<double> Total(const Sums<Pair>& pairs) {
+    const auto& s = pairs;
+    return {s.w.Sum(),   s.wr.Sum(),  s.wrr.Sum(),    s.wrb.Sum(),  s.wk.Sum(),
+            s.wkk.Sum(), s.wrk.Sum(), s.wCurve.Sum(), s.t.Sum(),    s.r.Sum(),
+            s.rr.Sum(),  s.rb.Sum(),  s.k.Sum(),      s.curve.Sum()};
+}
+
+// All the time of a fit goes here: two values at a time, in one loop for all sums.
+Sums<double> SumsOver(std::span<const double> fromEdge, double b, double kappa, double leastT) {
+    std::size_t i = 0;
+    Sums<double> sums;
+    if (std::abs(kappa) >= kSeriesShapes) {
         const double inverse = 1 / kappa;
-        for (const double d : deviations) {
-            sums.Add(Directly(b * d, kappa, inverse));
+        Sums<Pair> pairs;
+        for (; i + 1 < fromEdge.size(); i += 2) {
+            pairs.Add(Directly(b * Pair(fromEdge[i], fromEdge[i + 1]), kappa, inverse), leastT);
         }
+        sums = Total(pairs);
+    }
+    for (; i < fromEdge.size(); ++i) {
+        sums.Add(Transform(b * fromEdge[i], kappa), leastT);
     }
     return sums;
 }
 
-double FarthestOn(GevProfile::Side side, std::span<const double> values) {
-    return side == GevProfile::Side::UpperBound ? *std::max_element(values.begin(), values.end())
-                                                : *std::min_element(values.begin(), values.end());
-}
-
 } // namespace
 
-GevProfile::GevProfile(std::span<const double> sample, Side side)
-    : deviations(sample),
-      edge(FarthestOn(side, sample)),
-      lastLogT(std::log(std::abs(edge))) {}
+GevProfile::GevProfile(std::span<const double> sample, double edgeValue, const Closeness& end)
+    : fromEdge(sample),
+      edge(edgeValue),
+      least(*std::min_element(sample.begin(), sample.end())),
+      closeness(end),
+      last{0, std::log(std::abs(edge)), 0} {}
 
 // Means with the weights w are moments of a distribution: the derivatives of ln mean(w) are its
 // means, variances and covariance.
 GevProfile::Surface GevProfile::SurfaceAt(double b, double kappa) const {
-    const Sums s = SumsOver(deviations, b, kappa);
-    const auto n = static_cast<double>(deviations.size());
+    const double leastT = Transform(b * least, kappa).t;
+    const Sums<double> s = SumsOver(fromEdge, b, kappa, leastT);
+    const auto n = static_cast<double>(fromEdge.size());
     const double f = (1 - kappa) / n;
-    const double logWeight = std::log(s.w / n);
+    const double logWeight = std::log(s.w / n) - leastT;
     const double r = s.wr / s.w;
     const double k = s.wk / s.w;
     return {std::log(b) - logWeight - f * s.t - 1,
@@ -123,48 +137,56 @@ GevProfile::Surface GevProfile::SurfaceAt(double b, double kappa) const {
             s.wrb / s.w - (s.wrr / s.w - r * r) - f * s.rb,
             s.wrr / s.w - (s.wrk / s.w - r * k) + s.r / n - f * s.rr,
             s.wCurve / s.w - (s.wkk / s.w - k * k) + 2 * s.k / n - f * s.curve,
-            logWeight};
+            logWeight,
+            r,
+            k};
 }
 
+// Seen from the edge, the Gumbel location lies -edge away and at -t.
 double GevProfile::ScaleAt(double logT, double kappa) const {
-    return StandardOfReduced(std::copysign(std::exp(logT), edge), kappa) / edge;
+    return StandardOfReduced(std::copysign(std::exp(logT), edge), -kappa) / edge;
 }
 
-// With m = ln |t| at the edge, d ln b/dm = t/r, whose derivative in m is t/r (1 - t/(r q)).
+// With m = ln |t| and u the edge in units of the scale at the Gumbel location, d ln b/dm = t/u, the
+// derivative of which in m is t/u (1 - t/(b edge)); at a fixed m, d ln b/d kappa = (t/u - 1)/kappa.
 GevProfile::Sight GevProfile::Look(double logT, double kappa) const {
+    const double t = std::copysign(std::exp(logT), edge);
+    const double u = StandardOfReduced(t, kappa);
     const double b = ScaleAt(logT, kappa);
     const Surface at = SurfaceAt(b, kappa);
-    const Transformed end = Transform(b * edge, kappa);
-    const double ratio = end.t / end.r;
+    const double ratio = t / u;
     const double slope = at.b * ratio;
-    const double curvature = ratio * (at.bb * ratio + at.b * (1 - ratio / end.q));
+    const double curvature = ratio * (at.bb * ratio + at.b * (1 - t / (b * edge)));
     if (!std::isfinite(slope)) {
-        return {kNoProfile, std::numeric_limits<double>::quiet_NaN(), 0};
+        return {kNoProfile, -1, 1, 0};
     }
     const double toPath = -at.b / at.bb;
-    const double path = -at.bKappa / at.bb;
+    const double alongPath = -at.bKappa / at.bb;
+    const double drift = std::abs(kappa * u) < 1e-6 ? u / 2 : (ratio - 1) / kappa;
     return {{at.value + at.b * toPath / 2, at.kappa + at.bKappa * toPath,
-             at.kappaKappa + at.bKappa * path},
+             at.kappaKappa + at.bKappa * alongPath},
             curvature < 0 ? -slope / curvature : std::copysign(1.0, slope),
-            path / ratio + end.k / end.t};
+            ratio,
+            (alongPath - drift) / ratio};
 }
 
-// Newton's method in ln |t|, in a bracket that the direction of the steps narrows; a pass that
-// overflows has gone too high. It ends where the square of the step is small against the slope in
-// kappa, whose sign then is beyond doubt. At the end of a search in kappa that step is far smaller,
-// and the two searches together make Newton's method in both unknowns.
+// Newton's method in ln |t|, in a bracket that the direction of the steps narrows. It ends where
+// the square of the step is small against the slope in kappa, whose sign then is beyond doubt. Next
+// to a wild outlier a small step in ln |t| is a large one in ln b, and counts as such.
 ProfilePoint GevProfile::operator()(double kappa) {
-    double logT = lastLogT + std::clamp(pathSlope * (kappa - lastKappa), -1.0, 1.0);
+    double logT = ExpectedLogT(kappa);
     double lower = -std::numeric_limits<double>::infinity();
     double upper = std::numeric_limits<double>::infinity();
     for (int pass = 0; pass < 40; ++pass) {
         const Sight sight = Look(logT, kappa);
-        const double step = std::isnan(sight.step) ? -1 : sight.step;
-        const double size = std::abs(step);
-        if (size < 1e-9 || (size < 0.03 && size * size < 0.02 * std::abs(sight.point.slope))) {
-            lastKappa = kappa;
-            lastLogT = logT + step;
-            pathSlope = sight.pathSlope;
+        const double step = sight.step;
+        const double size = std::abs(step) * std::max(1.0, sight.scaleSlope / 3);
+        const double slope = std::abs(sight.point.slope);
+        if (size < 1e-9 || (size < closeness.largest && size * size < closeness.share * slope)) {
+            last = {kappa, logT + step, sight.pathSlope};
+            if (path.size() < 64) {
+                path.Add(last);
+            }
             return sight.point;
         }
         (step > 0 ? lower : upper) = logT;
@@ -174,12 +196,48 @@ ProfilePoint GevProfile::operator()(double kappa) {
     return kNoProfile;
 }
 
+double GevProfile::ExpectedLogT(double kappa) const {
+    return last.logT + std::clamp(last.slope * (kappa - last.kappa), -1.0, 1.0);
+}
+
+// A walk ends far from the maximum that it met.
+void GevProfile::GoBackTo(double kappa) {
+    for (const PathPoint& point : path) {
+        if (std::abs(point.kappa - kappa) < std::abs(last.kappa - kappa)) {
+            last = point;
+        }
+    }
+}
+
+std::optional<GevProfile::Maximum> GevProfile::MaximumNear(double kappa) {
+    GoBackTo(kappa);
+    double b = ScaleAt(ExpectedLogT(kappa), kappa);
+    for (int pass = 0; pass < 8; ++pass) {
+        const Surface at = SurfaceAt(b, kappa);
+        const double determinant = at.bb * at.kappaKappa - at.bKappa * at.bKappa;
+        const double inB = (at.kappa * at.bKappa - at.b * at.kappaKappa) / determinant;
+        const double inKappa = (at.b * at.bKappa - at.kappa * at.bb) / determinant;
+        const double size = std::max(std::abs(inB), std::abs(inKappa));
+        if (!(at.bb < 0 && determinant > 0 && size < 0.3)) {
+            return std::nullopt;
+        }
+        kappa += inKappa;
+        b *= std::exp(inB);
+        if (size < 2e-7) {
+            return Maximum{kappa, b,
+                           at.logMeanWeight - at.weightB * inB - at.weightKappa * inKappa};
+        }
+    }
+    return std::nullopt;
+}
+
 // The first call comes near the path, the second puts it right.
-GevProfile::Rest GevProfile::RestAt(double kappa) {
+GevProfile::Maximum GevProfile::PathAt(double kappa) {
+    GoBackTo(kappa);
     (*this)(kappa);
     (*this)(kappa);
-    const double b = ScaleAt(lastLogT, kappa);
-    return {b, SurfaceAt(b, kappa).logMeanWeight};
+    const double b = ScaleAt(last.logT, kappa);
+    return {kappa, b, SurfaceAt(b, kappa).logMeanWeight};
 }
 
 } // namespace ryn::stats

@@ -90,7 +90,7 @@ void Summarise(ResampledQuantile& quantile, const Spread& differences) {
 ResampledQuantiles Jackknife(const Combination& combination, const Distribution& fitted,
                              const FitInput& input, const QuantileRequests& requests) {
     const std::size_t n = input.values.size();
-    QuantileTally tally(fitted, input.frame, requests);
+    QuantileTally tally(fitted, input.frame, requests, Replicates::Dropped);
     if (n > 0) {
         AddDeletions(combination, Sorted(input), input.frame, tally);
     }

@@ -7,31 +7,43 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 #include <vector>
 
 namespace ryn::stats {
 
 namespace {
 
+// Of a sample that is all but symmetric the bound lies so far below that its distance, a million
+// times the spread, has swallowed the digits of what is estimated; rounding alone makes as much.
+constexpr double kSmallestAsymmetry = 1e-6;
+
 // Mean and deviation of the logarithms as they are: no correction of sigma for the sample size but
-// the divisor n - 1.
-Outcome<LogNormal> WithLowerBound(double xi, std::span<const double> ascending) {
-    if (!(xi < ascending.front())) {
-        return FitFailure{FitFault::LowerBoundTooHigh, {xi, ascending.front()}};
+// the divisor n - 1. With a largest value far out the bound comes so close to the smallest that
+// their distance has more digits than the bound.
+Outcome<LogNormal> WithLowerBound(double distance, std::span<const double> ascending) {
+    const double smallest = ascending.front();
+    const double xi = smallest - distance;
+    if (!IsBelow(smallest, distance)) {
+        return FitFailure{FitFault::LowerBoundTooHigh, {xi, smallest}};
     }
     std::vector<double> logs(ascending.size());
     std::transform(ascending.begin(), ascending.end(), logs.begin(),
-                   [xi](double x) { return std::log(x - xi); });
+                   [=](double x) { return std::log(x - smallest + distance); });
     const CentralMoments moments = CentralMomentsOf(logs);
     return Checked(LogNormal::Make({xi, moments.mean, moments.StandardDeviation()}));
 }
 
+// Of positive values, from their ratios to one of them: the distances of narrow samples to it keep
+// their digits.
 double GeometricMean(std::span<const double> values) {
+    const double middle = values[values.size() / 2];
     double sum = 0;
     for (const double x : values) {
-        sum += std::log(x);
+        const double excess = (x - middle) / middle;
+        sum += std::abs(excess) < 0.5 ? std::log1p(excess) : std::log(x / middle);
     }
-    return std::exp(sum / static_cast<double>(values.size()));
+    return middle * std::exp(sum / static_cast<double>(values.size()));
 }
 
 double Median(std::span<const double> ascending) {
@@ -61,12 +73,16 @@ Outcome<LogNormal> LogNormalAboveFromLMoments(double lowerBound, const LMoments&
         return FitFailure{FitFault::MeanExceedanceNotPositive};
     }
     const double lCv = moments.l2 / mean;
-    if (!(lCv > 0 && lCv < 1)) {
+    if (!IsLCv(lCv)) {
         return LMomentsOutOfRange(lCv, moments.LSkewness());
     }
     const double sigma = 2 * boost::math::erf_inv(lCv, QuietPolicy());
     return Checked(LogNormal::Make({lowerBound, std::log(mean) - sigma * sigma / 2, sigma},
                                    LocationType::Fixed));
+}
+
+bool IsBelow(double value, double distance) {
+    return distance > 2 * std::numeric_limits<double>::epsilon() * std::abs(value);
 }
 
 double CorrectedSkewness(const CentralMoments& moments, LogNormalType correction) {
@@ -89,7 +105,7 @@ bool IsCalibrated(std::size_t count, double correctedSkewness) {
 // The real root of the cubic is 2 sinh(asinh(g/2)/3), which keeps its digits for small g where
 // Cardano's form subtracts.
 Outcome<LogNormal> LogNormalFromMoments(const CentralMoments& moments, double correctedSkewness) {
-    if (!(correctedSkewness > 0)) {
+    if (!(correctedSkewness > kSmallestAsymmetry)) {
         return FitFailure{FitFault::SkewnessNotPositive, {correctedSkewness, 0}};
     }
     const double w = 2 * std::sinh(std::asinh(correctedSkewness / 2) / 3);
@@ -100,7 +116,7 @@ Outcome<LogNormal> LogNormalFromMoments(const CentralMoments& moments, double co
 }
 
 // Symmetry of a pair a, c about the geometric mean xg in ln(x + b) says (a + b)(c + b) = (xg +
-// b)^2.
+// b)^2. With p = a - xg and q = c - xg the pair's bound -b lies p^2/(p + q) below a.
 Outcome<LogNormal> LogNormalByBoundI(std::span<const double> ascending) {
     const std::size_t n = ascending.size();
     const double xg = GeometricMean(ascending);
@@ -108,29 +124,29 @@ Outcome<LogNormal> LogNormalByBoundI(std::span<const double> ascending) {
     double sum = 0;
     std::size_t used = 0;
     for (std::size_t i = 0; i < pairs; ++i) {
-        const double a = ascending[i];
-        const double c = ascending[n - 1 - i];
-        const double divisor = 2 * xg - a - c;
-        if (std::abs(divisor) >= 1e-6 * xg) {
-            sum += (a * c - xg * xg) / divisor;
+        const double p = ascending[i] - xg;
+        const double q = ascending[n - 1 - i] - xg;
+        if (std::abs(p + q) >= 1e-6 * xg) {
+            sum += ascending.front() - ascending[i] + p / (p + q) * p;
             ++used;
         }
     }
     if (used == 0) {
         return FitFailure{FitFault::NoConvergence};
     }
-    return WithLowerBound(-sum / static_cast<double>(used), ascending);
+    return WithLowerBound(sum / static_cast<double>(used), ascending);
 }
 
-// (x1 xn - med^2)/(x1 + xn - 2 med) in distances to the median, whose squares do not cancel.
+// (x1 xn - med^2)/(x1 + xn - 2 med) in distances to the median, whose squares do not cancel, and
+// from x1.
 Outcome<LogNormal> LogNormalByBoundII(std::span<const double> ascending) {
     const double median = Median(ascending);
     const double below = median - ascending.front();
     const double above = ascending.back() - median;
-    if (!(above > below)) {
+    if (!(above - below > kSmallestAsymmetry * above)) {
         return FitFailure{FitFault::LowerBoundUndefined};
     }
-    return WithLowerBound(median - below * above / (above - below), ascending);
+    return WithLowerBound(below / (above - below) * below, ascending);
 }
 
 } // namespace ryn::stats

@@ -26,8 +26,11 @@ double CorrectedSkewness(const CentralMoments& moments, LogNormalType correction
 /// of 0.25 to 5. Far beyond it grows without limit.
 bool IsCalibrated(std::size_t count, double correctedSkewness);
 
+/// Whether a bound `distance` below a value is below it as a double too, whatever the unit.
+bool IsBelow(double value, double distance);
+
 /// Three parameters from mean, s and a corrected skewness (Kite 1977; Stedinger et al. 1993).
-/// Fails: SkewnessNotPositive, InvalidParameters.
+/// Fails: SkewnessNotPositive (up to 1e-6, where rounding alone would tell), InvalidParameters.
 Outcome<LogNormal> LogNormalFromMoments(const CentralMoments& moments, double correctedSkewness);
 
 // The lower bound from order statistics, then mu and sigma as mean and standard deviation of
@@ -40,7 +43,8 @@ Outcome<LogNormal> LogNormalByBoundI(std::span<const double> ascending);
 
 /// Lower bound quantile method II (Stedinger 1980; Hoshi et al. 1984): smallest and largest value
 /// are made symmetric about the median.
-/// Fails: LowerBoundUndefined, LowerBoundTooHigh, InvalidParameters.
+/// Fails: LowerBoundUndefined (also where the two distances agree to six digits),
+/// LowerBoundTooHigh, InvalidParameters.
 Outcome<LogNormal> LogNormalByBoundII(std::span<const double> ascending);
 
 } // namespace ryn::stats

@@ -1,6 +1,7 @@
 #include "stats/checked.h"
 #include "stats/exceedances.h"
 #include "stats/likelihood_estimators.h"
+#include "stats/log_normal_estimators.h"
 #include "stats/profile_maximum.h"
 #include "stats/sample_statistics.h"
 
@@ -117,8 +118,9 @@ Outcome<LogNormal> MostLikelyLogNormal(std::span<const double> values, Likelihoo
         return FitFailure{FitFault::NoInteriorMaximum};
     }
     const double t = search.Highest()->place;
-    const double xi = smallest - unit * std::exp(t);
-    if (!(xi < smallest)) {
+    const double distance = unit * std::exp(t);
+    const double xi = smallest - distance;
+    if (!IsBelow(smallest, distance)) {
         return FitFailure{FitFault::LowerBoundTooHigh, {xi, smallest}};
     }
     const auto [mean, deviation] = profile.At(t);

@@ -4,6 +4,7 @@
 #include "stats/pearson_three_estimators.h"
 #include "stats/root.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace ryn::stats {
@@ -71,8 +72,10 @@ Outcome<LogPearsonThree> LogPearsonThreeFromMoments(const CentralMoments& moment
         return SkewnessOutOfRange(moments.Skewness());
     }
     double alpha = alphaOf(*v);
-    if (std::abs(alpha) < 1e-6) {
-        alpha = alpha < 0 ? -1e-6 : 1e-6;
+    // kappa is all but second/alpha^2. Narrow samples have small alphas of their own.
+    const double smallest = std::min(1e-6, 1e-5 * std::sqrt(second));
+    if (std::abs(alpha) < smallest) {
+        alpha = alpha < 0 ? -smallest : smallest;
     }
     const double kappa = second / MomentExcess(2, alpha);
     return Checked(LogPearsonThree::Make({std::log(m) + kappa * std::log1p(-alpha), alpha, kappa}));

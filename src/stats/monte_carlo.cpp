@@ -46,7 +46,7 @@ void Summarise(ResampledQuantile& quantile, const Spread& differences) {
 
 ResampledQuantiles MonteCarlo(const MonteCarloSubject& subject, const QuantileRequests& requests,
                               const MonteCarloSettings& settings) {
-    QuantileTally tally(subject.fitted, subject.frame, requests);
+    QuantileTally tally(subject.fitted, subject.frame, requests, Replicates::Kept);
     UniformDraws draws(settings.seed);
     FitScratch scratch;
     SeriesFrame frame = subject.frame;

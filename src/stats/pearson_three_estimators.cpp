@@ -10,9 +10,12 @@ namespace ryn::stats {
 
 namespace {
 
-// Without skewness the distribution is normal, with infinite kappa.
+// Without skewness the distribution is normal, with infinite kappa. What rounding leaves of a
+// symmetric sample has no sign of its own, else a change of unit could turn the fit around.
 double AwayFromZero(double skewness, double smallest) {
-    return std::abs(skewness) < smallest ? (skewness < 0 ? -smallest : smallest) : skewness;
+    constexpr double kRounding = 1e-7;
+    return std::abs(skewness) < smallest ? (skewness < -kRounding ? -smallest : smallest)
+                                         : skewness;
 }
 
 } // namespace
@@ -31,7 +34,7 @@ Outcome<PearsonThree> PearsonThreeFromLMoments(const LMoments& moments) {
     const FitFailure outside = LMomentsOutOfRange(moments.LCv(), moments.LSkewness());
     const double t3 = AwayFromZero(moments.LSkewness(), 1e-4);
     const double size = std::abs(t3);
-    if (!(size < 1)) {
+    if (!IsLSkewness(t3)) {
         return outside;
     }
     const auto excess = [size](double logKappa) {
@@ -63,7 +66,7 @@ Outcome<PearsonThree> GammaAboveFromLMoments(double threshold, const LMoments& m
     }
     const double lCv = moments.l2 / mean;
     const FitFailure outside = LMomentsOutOfRange(lCv, moments.LSkewness());
-    if (!(lCv > 0 && lCv < 1)) {
+    if (!IsLCv(lCv)) {
         return outside;
     }
     const auto excess = [lCv](double logKappa) {

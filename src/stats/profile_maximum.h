@@ -33,10 +33,11 @@ struct Peak {
 /// falls, by Newton's method on the slope. A step that leaves the bracket, goes down or does not
 /// halve the one before gives way to a bisection, so that the bracket always closes. The unknown
 /// must be free of units and of the order of 1: the end is a step below 1e-9, which is still taken
-/// and leaves an error of the order of its square. Nothing when the slope is NaN on the way, or
-/// after 100 evaluations.
+/// and leaves an error of the order of its square; with a `precision` that is coarser the end is a
+/// step below that. Nothing when the slope is NaN on the way, or after 100 evaluations.
 template <class F>
-std::optional<Peak> MaximumBetween(F&& profile, Bracket bracket, double start) {
+std::optional<Peak> MaximumBetween(F&& profile, Bracket bracket, double start,
+                                   double precision = 1e-9) {
     double place = start;
     double lastMove = bracket.upper - bracket.lower;
     for (int evaluation = 0; evaluation < 100; ++evaluation) {
@@ -48,7 +49,7 @@ std::optional<Peak> MaximumBetween(F&& profile, Bracket bracket, double start) {
         const double step = -at.slope / at.curvature;
         const double next = place + step;
         const bool uphill = at.curvature < 0;
-        if ((uphill && std::abs(step) < 1e-9) || at.slope == 0) {
+        if ((uphill && std::abs(step) < precision) || at.slope == 0) {
             return Peak{at.slope == 0 ? place : next, at.value};
         }
         const bool useful = uphill && next > bracket.lower && next < bracket.upper &&
@@ -83,17 +84,28 @@ std::optional<Peak> PeakInside(F&& profile, Bracket bracket, double start) {
 /// over.
 class PeakSearch {
   public:
+    /// `placePrecision` as in MaximumBetween.
+    explicit PeakSearch(double placePrecision = 1e-9) : precision(placePrecision) {}
+
     /// The highest so far; nothing when none was met.
     const std::optional<Peak>& Highest() const { return highest; }
     /// The highest value at an end of a walk. Minus infinity before the first.
     double HighestEnd() const { return highestEnd; }
 
+    /// A maximum that is known from elsewhere.
+    void Note(const Peak& peak) {
+        if (!highest || peak.value > highest->value) {
+            highest = peak;
+        }
+    }
+
     /// From `from` to `to`, which may lie on either side, in equal steps. Ends early where the
     /// profile ends. A profile that follows the best values of the other unknowns along the walk
-    /// is asked for neighbouring places one after the other.
+    /// is asked for neighbouring places one after the other. Gives what was found at `from`.
     template <class F>
-    void Walk(F&& profile, double from, double to, int steps) {
+    ProfilePoint Walk(F&& profile, double from, double to, int steps) {
         Station here{from, profile(from)};
+        const ProfilePoint first = here.at;
         NoteEnd(here);
         for (int i = 1; i <= steps && !std::isnan(here.at.slope); ++i) {
             const double place = i == steps ? to : from + (to - from) * i / steps;
@@ -102,6 +114,7 @@ class PeakSearch {
             here = next;
         }
         NoteEnd(here);
+        return first;
     }
 
   private:
@@ -155,12 +168,12 @@ class PeakSearch {
     void Climb(F& profile, const Station& a, const Station& b) {
         const double share = a.at.slope / (a.at.slope - b.at.slope);
         const double start = a.place + share * (b.place - a.place);
-        const auto peak = MaximumBetween(profile, {a.place, b.place}, start);
-        if (peak && (!highest || peak->value > highest->value)) {
-            highest = peak;
+        if (const auto peak = MaximumBetween(profile, {a.place, b.place}, start, precision)) {
+            Note(*peak);
         }
     }
 
+    double precision;
     std::optional<Peak> highest;
     double highestEnd = -std::numeric_limits<double>::infinity();
 };

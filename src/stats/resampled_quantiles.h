@@ -23,6 +23,10 @@ struct ResampledQuantile {
     double average = 0;  ///< mean of the resamples (Monte Carlo), or corrected for bias (jackknife)
     double standardDeviation = 0;
     double bias = 0; ///< of the estimate, as the resamples show it
+    /// Ends of the 95 % percentile interval (Efron and Tibshirani 1993), which follows the skewness
+    /// that estimate and deviation cannot show. Only of Monte Carlo and only at return periods.
+    double lower = std::numeric_limits<double>::quiet_NaN();
+    double upper = std::numeric_limits<double>::quiet_NaN();
 };
 
 /// The outcome of a Monte Carlo or jackknife pass.

@@ -121,7 +121,7 @@ LMoments LMomentsOfSorted(std::span<const double> sorted) {
 SampleStatistics SampleStatisticsOf(std::span<const double> values) {
     std::vector<double> sorted(values.begin(), values.end());
     SortAscending(sorted);
-    const CentralMoments central = CentralMomentsOf(values);
+    const CentralMoments central = CentralMomentsOf(sorted);
     const LMoments l = LMomentsOfSorted(sorted);
     return {.count = values.size(),
             .mean = central.mean,

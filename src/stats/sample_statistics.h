@@ -80,7 +80,7 @@ struct SampleStatistics {
     double lKurtosis = 0;
 };
 
-/// Any order; sorts a copy.
+/// Any order, which shows in no bit: sorts a copy.
 SampleStatistics SampleStatisticsOf(std::span<const double> values);
 
 } // namespace ryn::stats

@@ -115,6 +115,11 @@ Outcome<TruncatedGumbelFit> MostLikelyTruncatedGumbel(double threshold,
     const TruncatedGumbelProfile profile(buffer);
     PeakSearch search;
     search.Walk(profile, std::log(0.05), std::log(20), 12);
+    // The exponential with the mean of the sample is a maximum of its own where it is the limit
+    // there; with a minimum close by it is no change of sign for the walk.
+    if (profile.CAt(0) == 0) {
+        search.Note({0, profile(0).value});
+    }
     if (!search.Highest() || search.Highest()->value < search.HighestEnd()) {
         return FitFailure{FitFault::NoInteriorMaximum};
     }

@@ -29,6 +29,9 @@ Outcome<Weibull> WeibullFromMoments(const CentralMoments& moments) {
 
 Outcome<Weibull> WeibullFromLMoments(const LMoments& moments) {
     const double t3 = moments.LSkewness();
+    if (!IsLSkewness(t3)) {
+        return LMomentsOutOfRange(moments.LCv(), t3);
+    }
     const auto excess = [t3](double h) { return GevLSkewness(h) + t3; };
     const auto h = RootNear(excess, {1e-9, 100}, GevShapeNear(-t3), 1e-3);
     if (!h) {
@@ -67,7 +70,7 @@ Outcome<Weibull> WeibullAboveFromLMoments(double threshold, const LMoments& mome
         return FitFailure{FitFault::MeanExceedanceNotPositive};
     }
     const double lCv = moments.l2 / mean;
-    if (!(lCv > 0 && lCv < 1)) {
+    if (!IsLCv(lCv)) {
         return LMomentsOutOfRange(lCv, moments.LSkewness());
     }
     const double h = -std::log1p(-lCv) / std::numbers::ln2;

@@ -278,6 +278,20 @@ TYPED_TEST(DistributionContract, SurvivalInvertsTheQuantileOfExceedance) {
     }
 }
 
+// Through the smaller of both tails, whose rounding moves x the least.
+TYPED_TEST(DistributionContract, QuantileInvertsTheCdf) {
+    for (const auto& d : this->valid) {
+        for (const double p : Probabilities()) {
+            const double x = Quantile(d, p);
+            const bool lower = p < 0.5;
+            const double tail = lower ? Cdf(d, x) : Survival(d, x);
+            const double back = lower ? Quantile(d, tail) : QuantileOfExceedance(d, tail);
+            const double rounding = 8 * kEpsilon * Level(d, x) + 2e-14 * tail / Density(d, x);
+            EXPECT_NEAR(back, x, 2 * rounding) << p;
+        }
+    }
+}
+
 TYPED_TEST(DistributionContract, CdfAndSurvivalAddUpToOne) {
     for (const auto& d : this->valid) {
         for (const double p : Probabilities()) {

@@ -1,7 +1,10 @@
 #include "apps/cli/command_options.h"
 
+#include <algorithm>
 #include <cmath>
+#include <utility>
 
+#include "apps/cli/nearest_names.h"
 #include "base/number_text.h"
 #include "strings/catalogue.h"
 
@@ -13,9 +16,39 @@ std::string TextOf(int id) {
     return std::string(Text(id));
 }
 
-[[noreturn]] void Refuse(const std::string& option, const std::string& value, int expectedTextId) {
+[[noreturn]] void Refuse(const std::string& option, const std::string& value,
+                         const std::string& expected) {
     // CLI11 takes a refusal as an exception of its own, which ends at the parse.
-    throw CLI::ValidationError(FormatText(kTextCliBadValue, option, value, TextOf(expectedTextId)));
+    throw CLI::ValidationError(FormatText(kTextCliBadValue, option, value, expected));
+}
+
+[[noreturn]] void Refuse(const std::string& option, const std::string& value, int expectedTextId) {
+    Refuse(option, value, TextOf(expectedTextId));
+}
+
+bool IsSameInAnyCase(std::string_view a, std::string_view b) {
+    const auto lower = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c; };
+    return std::equal(a.begin(), a.end(), b.begin(), b.end(),
+                      [lower](char x, char y) { return lower(x) == lower(y); });
+}
+
+std::optional<int> ChoiceOf(std::string_view text, const Choices& choices) {
+    const std::optional<int> number =
+        choices.numbers == ChoiceNumbers::Taken ? ParseInt(text) : std::nullopt;
+    for (std::size_t i = 0; i < choices.names.size(); ++i)
+        if (number == static_cast<int>(i) || IsSameInAnyCase(text, choices.names[i]))
+            return static_cast<int>(i);
+    return std::nullopt;
+}
+
+/// "none, montecarlo", or "0 Weibull, 1 Hazen".
+std::string ChoiceList(const Choices& choices) {
+    std::vector<std::string> names;
+    for (const std::string_view name : choices.names)
+        names.push_back(choices.numbers == ChoiceNumbers::Taken
+                            ? std::to_string(names.size()) + ' ' + std::string(name)
+                            : std::string(name));
+    return JoinNames(names);
 }
 
 } // namespace
@@ -113,6 +146,22 @@ void AddNumberOption(CLI::App& command, const ValueOption& option, std::optional
                 *value = ParseDouble(text);
                 if (!*value || !std::isfinite(**value))
                     Refuse(name, text, kTextCliExpectNumber);
+            },
+            TextOf(option.helpTextId))
+        ->type_name(option.valueName);
+}
+
+void AddChoiceOption(CLI::App& command, const ValueOption& option, const Choices& choices,
+                     std::function<void(int)> store) {
+    const std::string name = option.names;
+    command
+        .add_option_function<std::string>(
+            option.names,
+            [choices, store = std::move(store), name](const std::string& text) {
+                const std::optional<int> choice = ChoiceOf(text, choices);
+                if (!choice)
+                    Refuse(name, text, ChoiceList(choices));
+                store(*choice);
             },
             TextOf(option.helpTextId))
         ->type_name(option.valueName);

@@ -1,7 +1,10 @@
 #pragma once
 
+#include <functional>
 #include <optional>
+#include <span>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include <CLI/App.hpp>
@@ -41,6 +44,18 @@ void AddIntOption(CLI::App& command, const ValueOption& option, int least,
                   std::optional<int>* value);
 /// A finite number with a decimal point, whatever the locale.
 void AddNumberOption(CLI::App& command, const ValueOption& option, std::optional<double>* value);
+
+/// Whether a choice may also be typed as its number, from 0.
+enum class ChoiceNumbers { Taken, NotTaken };
+
+/// The values that an option can have.
+struct Choices {
+    std::span<const std::string_view> names; ///< stay the caller's; taken in any case
+    ChoiceNumbers numbers = ChoiceNumbers::Taken;
+};
+/// One of several values; `store` gets its number.
+void AddChoiceOption(CLI::App& command, const ValueOption& option, const Choices& choices,
+                     std::function<void(int)> store);
 /// One that may be given several times; each takes one value.
 void AddListOption(CLI::App& command, const ValueOption& option, std::vector<std::string>* values);
 

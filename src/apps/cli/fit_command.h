@@ -1,27 +1,14 @@
 #pragma once
 
-#include <optional>
-#include <string>
-
 #include "apps/cli/command_line.h"
 #include "apps/cli/console.h"
+#include "apps/cli/fit_task.h"
 
 namespace ryn::cli {
 
-/// `ryn fit`: one combination of distribution and estimation method fitted to a column of numbers
-/// or to a data file, with its quantiles.
-struct FitOptions {
-    std::string name;                   ///< of the combination: "GEV/LMOM"
-    std::string values;                 ///< a text, a data file, or "-" for standard input
-    std::optional<int> item;            ///< of a data file, from 1; none: the first
-    std::optional<std::string> periods; ///< "2,10,100" in years
-    bool partialDurations = false;      ///< with rate and threshold; else annual maxima
-    std::optional<double> rate;         ///< events a year
-    std::optional<double> threshold;    ///< in the unit of the values
-    OutputForm form = OutputForm::Text;
-};
-
-/// kExitAnalysis when the combination cannot be fitted.
+/// `ryn fit`: combinations of distribution and estimation method fitted to a column of numbers or
+/// to a data file, with their quantiles and how well they fit. kExitAnalysis when the series cannot
+/// be analysed or no combination can be fitted; one that cannot among others that can is told.
 int RunFit(const FitOptions& options, Console& console);
 void AddFitCommand(CommandLine& line);
 

@@ -5,6 +5,7 @@
 #include <ostream>
 
 #include "apps/cli/plain_text.h"
+#include "apps/cli/settings.h"
 #include "apps/cli/text_table.h"
 #include "base/number_text.h"
 #include "strings/catalogue.h"
@@ -17,35 +18,24 @@ std::string TextOf(int id) {
     return std::string(Text(id));
 }
 
-Json JsonOfParameters(const FitReport& report) {
-    Json list = Json::array();
-    if (report.model)
-        for (const stats::Parameter& parameter : report.model->parameters)
-            list.push_back({{"symbol", parameter.symbol}, {"estimate", JsonOf(parameter.value)}});
-    return list;
-}
-
-Json JsonOfQuantile(const FitQuantile& quantile) {
-    return {{"period", JsonOf(quantile.period)},
-            {"probability", JsonOf(quantile.exceedance)},
-            {"estimate", JsonOf(quantile.estimate)},
-            {"average", nullptr},
-            {"standardDeviation", nullptr}};
+/// Whether fixed notation shows a number in few digits: neither the probability of the
+/// 10^30-year event nor an event of 10^300.
+bool IsOfCommonSize(double value) {
+    const double size = std::fabs(value);
+    return value == 0.0 || (size >= 1e-9 && size < 1e15);
 }
 
 /// "-" stands for a number that there is none of, such as the likelihood of a fit that leaves a
 /// value outside its range.
-std::string NumberText(double value) {
-    constexpr int kDigits = 6;
-    return std::isfinite(value) ? FixedText(value, DecimalsFor(value, kDigits)) : "-";
+std::string NumberText(double value, int decimals) {
+    if (!std::isfinite(value))
+        return "-";
+    return IsOfCommonSize(value) ? FixedText(value, decimals) : ShortestText(value);
 }
 
-void PrintParameters(std::ostream& out, const stats::FittedModel& model) {
-    TextTable table({Alignment::Left, Alignment::Right});
-    for (const stats::Parameter& parameter : model.parameters)
-        table.AddRow({std::string(parameter.symbol), NumberText(parameter.value)});
-    table.AddRow({TextOf(kTextCliLogLikelihood), NumberText(model.logLikelihood)});
-    table.Print(out);
+std::string NumberText(double value) {
+    constexpr int kDigits = 6;
+    return NumberText(value, DecimalsFor(value, kDigits));
 }
 
 /// One number of decimals for a whole column, so that its points stand below each other: what the
@@ -53,30 +43,97 @@ void PrintParameters(std::ostream& out, const stats::FittedModel& model) {
 int ColumnDecimals(const std::vector<double>& numbers, int digits) {
     int decimals = 0;
     for (const double number : numbers)
-        decimals = std::max(decimals, DecimalsFor(number, digits));
+        if (IsOfCommonSize(number))
+            decimals = std::max(decimals, DecimalsFor(number, digits));
     return decimals;
+}
+
+void PrintParameters(std::ostream& out, const stats::FittedModel& model) {
+    TextTable table({Alignment::Left, Alignment::Right});
+    for (const stats::Parameter& parameter : model.parameters)
+        table.AddRow({std::string(parameter.symbol), NumberText(parameter.value)});
+    table.Print(out);
+}
+
+std::string LevelText(double percent) {
+    constexpr int kDecimals = 2;
+    return FormatText(kTextCliLevel, NumberText(percent, kDecimals));
+}
+
+void PrintGoodness(std::ostream& out, const FitReport& report) {
+    const FitGoodness& goodness = *report.goodness;
+    const stats::ChiSquaredTest& chiSquared = goodness.chiSquared;
+    const std::string positions =
+        FormatText(kTextCliPositions,
+                   std::string(kPlottingMethodNames[static_cast<std::size_t>(report.plotting)]));
+    const std::string classes =
+        FormatText(kTextCliClasses, chiSquared.classes.size(), chiSquared.degreesOfFreedom);
+    TextTable table({Alignment::Left, Alignment::Right, Alignment::Left});
+    table.AddRow({TextOf(kTextCliChiSquared), NumberText(chiSquared.statistic),
+                  LevelText(chiSquared.level) + classes});
+    table.AddRow({TextOf(kTextCliKolmogorovSmirnov),
+                  NumberText(goodness.kolmogorovSmirnov.statistic),
+                  LevelText(goodness.kolmogorovSmirnov.level)});
+    table.AddRow({"SLSC", NumberText(goodness.leastSquares), positions});
+    table.AddRow({"PPCC I", NumberText(goodness.correlation), positions});
+    table.AddRow({"PPCC II", NumberText(goodness.reducedCorrelation), positions});
+    table.AddRow({TextOf(kTextCliLogLikelihood), NumberText(report.model->logLikelihood)});
+    table.AddRow({"AIC", NumberText(goodness.akaike)});
+    table.Print(out);
+}
+
+/// So many that estimates and deviations have their digits; in all columns of the same unit.
+int QuantileDecimals(const stats::ResampledQuantiles& quantiles) {
+    constexpr int kEstimateDigits = 5;
+    constexpr int kDeviationDigits = 3;
+    std::vector<double> estimates;
+    std::vector<double> deviations;
+    for (const stats::ResampledQuantile& quantile : quantiles.atPeriods) {
+        estimates.push_back(quantile.estimate);
+        deviations.push_back(quantile.standardDeviation);
+    }
+    return std::max(ColumnDecimals(estimates, kEstimateDigits),
+                    ColumnDecimals(deviations, kDeviationDigits));
+}
+
+std::vector<std::string> QuantileHeading(const FitReport& report) {
+    const std::string unit = report.unit.empty() ? "" : " [" + PlainLine(report.unit) + ']';
+    std::vector<std::string> row{TextOf(kTextCliReturnPeriod), TextOf(kTextCliExceedance),
+                                 TextOf(kTextCliEstimate) + unit};
+    if (report.uncertainty != FitUncertainty::None)
+        for (const int id : {kTextCliAverage, kTextCliStandardDeviation, kTextCliBias})
+            row.push_back(TextOf(id));
+    return row;
 }
 
 void PrintQuantiles(std::ostream& out, const FitReport& report) {
     constexpr int kProbabilityDigits = 3;
-    constexpr int kEstimateDigits = 5;
-    std::vector<double> probabilities;
-    std::vector<double> estimates;
-    for (const FitQuantile& quantile : report.quantiles) {
-        probabilities.push_back(quantile.exceedance);
-        estimates.push_back(quantile.estimate);
+    const int probabilityDecimals = ColumnDecimals(report.exceedances, kProbabilityDigits);
+    const int decimals = QuantileDecimals(report.quantiles);
+    const std::vector<std::string> heading = QuantileHeading(report);
+    TextTable table(std::vector<Alignment>(heading.size(), Alignment::Right));
+    table.AddRow(heading);
+    for (std::size_t i = 0; i < report.periods.size(); ++i) {
+        const stats::ResampledQuantile& quantile = report.quantiles.atPeriods[i];
+        // The table drops what it has no column for.
+        table.AddRow({ShortestText(report.periods[i]),
+                      NumberText(report.exceedances[i], probabilityDecimals),
+                      NumberText(quantile.estimate, decimals),
+                      NumberText(quantile.average, decimals),
+                      NumberText(quantile.standardDeviation, decimals),
+                      NumberText(quantile.bias, decimals)});
     }
-    const int probabilityDecimals = ColumnDecimals(probabilities, kProbabilityDigits);
-    const int estimateDecimals = ColumnDecimals(estimates, kEstimateDigits);
-    TextTable table({Alignment::Right, Alignment::Right, Alignment::Right});
-    const std::string unit = report.unit.empty() ? "" : " [" + PlainLine(report.unit) + ']';
-    table.AddRow({TextOf(kTextCliReturnPeriod), TextOf(kTextCliExceedance),
-                  TextOf(kTextCliEstimate) + unit});
-    for (const FitQuantile& quantile : report.quantiles)
-        table.AddRow({ShortestText(quantile.period),
-                      FixedText(quantile.exceedance, probabilityDecimals),
-                      FixedText(quantile.estimate, estimateDecimals)});
     table.Print(out);
+}
+
+void PrintResamples(std::ostream& out, const FitReport& report) {
+    if (report.uncertainty == FitUncertainty::None)
+        return;
+    const int method =
+        report.uncertainty == FitUncertainty::MonteCarlo ? kTextCliMonteCarlo : kTextCliJackknife;
+    out << FormatText(kTextCliResamples, TextOf(method), report.quantiles.asked,
+                      report.quantiles.Failed())
+        << '\n';
 }
 
 } // namespace
@@ -89,25 +146,22 @@ int DecimalsFor(double value, int significantDigits) {
     return std::clamp(significantDigits - 1 - static_cast<int>(magnitude), 0, kMost);
 }
 
-Json JsonOfFit(const FitReport& report) {
-    Json quantiles = Json::array();
-    for (const FitQuantile& quantile : report.quantiles)
-        quantiles.push_back(JsonOfQuantile(quantile));
-    return {{"name", report.name},
-            {"n", report.count},
-            {"unit", report.unit},
-            {"failed", report.failure.empty() ? Json(nullptr) : Json(report.failure)},
-            {"parameters", JsonOfParameters(report)},
-            {"logLikelihood", report.model ? JsonOf(report.model->logLikelihood) : Json(nullptr)},
-            {"quantiles", std::move(quantiles)},
-            {"goodness", Json::object()}};
-}
-
 void PrintFit(std::ostream& out, const FitReport& report) {
-    out << FormatText(kTextCliFitHeading, report.name, static_cast<int>(report.count)) << "\n\n";
+    if (!report.model) {
+        out << FormatText(kTextCliFitFailed, report.name, report.failure) << '\n';
+        return;
+    }
+    out << FormatText(report.sampleCorrection ? kTextCliFitHeadingCorrected : kTextCliFitHeading,
+                      report.name, report.count)
+        << "\n\n";
     PrintParameters(out, *report.model);
     out << '\n';
+    PrintGoodness(out, report);
+    if (report.periods.empty())
+        return;
+    out << '\n';
     PrintQuantiles(out, report);
+    PrintResamples(out, report);
 }
 
 } // namespace ryn::cli

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <functional>
 
 #include "base/number_text.h"
 #include "strings/catalogue.h"
@@ -10,17 +9,6 @@
 namespace ryn::cli {
 
 namespace {
-
-bool AreAllEqual(std::span<const double> values) {
-    return !values.empty() &&
-           std::adjacent_find(values.begin(), values.end(), std::not_equal_to<>()) == values.end();
-}
-
-/// Whether a fault is what a sample without spread comes to; the others say more than that it has
-/// none.
-bool ComesFromSpread(stats::FitFault fault) {
-    return fault >= stats::FitFault::SkewnessOutOfRange && fault < stats::FitFault::NotAvailable;
-}
 
 int TextIdOf(const stats::FitFailure& failure) {
     if (failure.fault == stats::FitFault::DistributionNotOffered &&
@@ -40,21 +28,56 @@ std::string ReasonOf(const stats::FitFailure& failure) {
     return FormatText(TextIdOf(failure), text(failure.numbers[0]), text(failure.numbers[1]));
 }
 
+template <typename Predicate>
+std::ptrdiff_t CountWhere(const FitReport& report, Predicate isMeant) {
+    const auto& quantiles = report.quantiles.atPeriods;
+    return std::count_if(quantiles.begin(), quantiles.end(), isMeant);
+}
+
+void AddBeyondNumbers(const FitReport& report, std::vector<std::string>& warnings) {
+    const auto lost = CountWhere(report, [](const stats::ResampledQuantile& quantile) {
+        return !std::isfinite(quantile.estimate);
+    });
+    if (lost > 0)
+        warnings.push_back(FormatText(kTextCliBeyondNumbers, lost));
+}
+
+// One warning for each cause: where too few resamples could be fitted, every period lacks its
+// average for that reason.
+void AddNoUncertainty(const FitReport& report, std::vector<std::string>& warnings) {
+    const stats::ResampledQuantiles& found = report.quantiles;
+    if (found.asked == 0) // no uncertainty was wanted
+        return;
+    if (found.kept < found.needed) {
+        warnings.push_back(
+            FormatText(kTextCliNoUncertainty, found.kept, found.asked, found.needed));
+        return;
+    }
+    const auto without = CountWhere(report, [](const stats::ResampledQuantile& quantile) {
+        return std::isfinite(quantile.estimate) && !std::isfinite(quantile.average);
+    });
+    if (without > 0)
+        warnings.push_back(FormatText(kTextCliPeriodsWithoutUncertainty, without));
+}
+
 } // namespace
 
-std::string FitFailureText(const stats::FitFailure& failure, std::span<const double> values) {
-    const std::string code = stats::FailureCode(failure);
-    const std::string reason =
-        ComesFromSpread(failure.fault) && AreAllEqual(values)
-            ? FormatText(kTextCliFitAllEqual, static_cast<int>(values.size()),
-                         ShortestText(values.front()))
-            : ReasonOf(failure);
-    return code.empty() ? reason : code + ": " + reason;
+std::string FitFailureText(const stats::FitFailure& failure) {
+    return stats::FailureCode(failure) + ": " + ReasonOf(failure);
 }
 
 std::string FitWarningText(const stats::FitWarning& warning) {
     return FormatText(kTextCliFitOutsideSupport + static_cast<int>(warning.kind) - 1,
                       static_cast<int>(warning.count));
+}
+
+std::vector<std::string> FitWarnings(const FitReport& report) {
+    std::vector<std::string> warnings;
+    for (const stats::FitWarning& warning : report.model->warnings)
+        warnings.push_back(FitWarningText(warning));
+    AddBeyondNumbers(report, warnings);
+    AddNoUncertainty(report, warnings);
+    return warnings;
 }
 
 } // namespace ryn::cli

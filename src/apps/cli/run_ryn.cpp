@@ -13,6 +13,7 @@
 #include "apps/cli/info_command.h"
 #include "apps/cli/new_command.h"
 #include "apps/cli/run_command.h"
+#include "apps/cli/self_check_command.h"
 #include "apps/cli/set_command.h"
 #include "apps/cli/show_command.h"
 #include "base/file_access.h"
@@ -48,6 +49,7 @@ int RunCommand(const std::vector<std::string>& arguments, Console& console) {
     AddRunCommand(line);
     AddShowCommand(line);
     AddFitCommand(line);
+    AddSelfCheckCommand(line);
     return line.Run(arguments, console);
 }
 

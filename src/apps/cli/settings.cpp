@@ -16,8 +16,6 @@ using Names = std::span<const std::string_view>;
 constexpr std::array<std::string_view, 2> kSelectionMethods = {"AMS", "PDS"};
 constexpr std::array<std::string_view, 2> kPdsDataTypes = {"threshold", "number"};
 constexpr std::array<std::string_view, 2> kUncertaintyTypes = {"MonteCarlo", "Jackknife"};
-constexpr std::array<std::string_view, 5> kPlottingMethods = {"Weibull", "Hazen", "Gringorten",
-                                                              "Blom", "Cunnane"};
 constexpr std::array<std::string_view, 3> kSplitMethods = {"date", "season", "custom"};
 
 /// Collects the settings of one section.
@@ -93,7 +91,7 @@ void AddAnalysisChoices(std::vector<Setting>& settings, CAnalysisKvf& analysis) 
     section.Add("PPCCTest2", &analysis.PPCCTest2);
     section.Add("LogLikelihood", &analysis.LogLikelihood);
     section.Add("UncertaintyCalcType", &analysis.UncertaintyCalcType, kUncertaintyTypes);
-    section.Add("PlottingMethod", &analysis.PlottingMethod, kPlottingMethods);
+    section.Add("PlottingMethod", &analysis.PlottingMethod, kPlottingMethodNames);
 }
 
 void AddAnalysisLists(std::vector<Setting>& settings, CAnalysisKvf& analysis) {

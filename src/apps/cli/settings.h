@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <span>
 #include <string>
 #include <string_view>
@@ -10,6 +11,10 @@
 #include "params/global_kvf.h"
 
 namespace ryn::cli {
+
+/// Of the plotting position formulas, by their numbers in the setup file.
+inline constexpr std::array<std::string_view, 5> kPlottingMethodNames = {
+    "Weibull", "Hazen", "Gringorten", "Blom", "Cunnane"};
 
 /// A member that holds a file name: absolute in memory, typed relative to the caller's directory.
 struct FileNameMember {

@@ -72,8 +72,10 @@ TEST(GoodnessReport, ShowsWhatEachMeasureIsMadeOf) {
           "  SLSC                            0.0156744\n",
           "  Log-likelihood                    4.29495\n",
           "  Akaike's criterion               -2.58991\n",
-          "              x              p           F(x)  quantile of p     difference\n",
-          "              1        3.57000     0.00920245      0.0148458        3.54640 "})
+          "           rank          place              x              p           F(x)  quantile "
+          "of p",
+          "              1             19        3.57000     0.00920245      0.0148458        "
+          "3.54640 "})
         EXPECT_THAT(report, HasSubstr(line));
 }
 
@@ -86,6 +88,29 @@ TEST(QuantileReport, TellsMethodProbabilitiesAndBounds) {
           "             10       0.109091        66.4610        66.4610",
           "\nResamples that could not be fitted: 0 of 44\n"})
         EXPECT_THAT(report, HasSubstr(line));
+}
+
+// Two signs are in use for one shape, and the bound of a negative alpha is easily overlooked.
+TEST(QuantileReport, TellsWhatEachShapeMeans) {
+    const std::string maxima =
+        EngineRunOf(
+            {"portpirie", {"GEV/LMOM", "WEI/MOM", "FRE/MOM", "P3/MOM", "LP3/MOM/LOG", "LN2/MOM"}})
+            .File("Rynout2.txt");
+    for (const char* line :
+         {"  kappa has Hosking's sign (shape in Coles (2001): -0.0512120): upper bound at 7.84",
+          "here lighter, no upper bound\n", "x^-kappa (a GEV of shape -0.04546",
+          "2/sqrt(kappa): no upper bound\n", "  of the logarithms, alpha has the sign"})
+        EXPECT_THAT(maxima, HasSubstr(line));
+    EXPECT_THAT(EngineRunOf({"rain40", {"GP2/LMOM"}}).File("Rynout2.txt"),
+                HasSubstr(": heavy tail, no upper bound\n"));
+}
+
+TEST(QuantileReport, HasPercentileIntervalsOfMonteCarloAlone) {
+    const std::string table = "           T          lower       estimate          upper\n";
+    const std::string drawn = EngineRunOf({"rain40", {"GP2/LMOM"}}).File("Rynout2.txt");
+    EXPECT_THAT(drawn, HasSubstr(table));
+    EXPECT_THAT(EngineRunOf({"rain40", {"GP2/LMOM"}, 1}).File("Rynout2.txt"),
+                Not(HasSubstr(table)));
 }
 
 TEST(EngineFiles, HoldNothingThatWasNotAskedFor) {

@@ -177,6 +177,23 @@ TEST(ResultTree, HoldsAFailedCombinationInFull) {
     }
 }
 
+// To the bit, resamples included.
+TEST(ResultTree, HoldsNumbersThatDoNotDependOnTheOtherCombinations) {
+    const auto numbersOf = [](const std::vector<std::string>& names, int item) {
+        const EngineRunOf run({"portpirie", names});
+        const std::string path = "DistributionAnalysis/Item" + std::to_string(item);
+        std::vector<double> numbers;
+        for (const char* const list : {"TyearEvent", "AvgTyearEvent", "StdTyearEvent"}) {
+            for (int i = 1; i <= 3; ++i)
+                numbers.push_back(NumberAt(run.Target(), path + "/TyearEventTable/" + list, i));
+            numbers.push_back(NumberAt(run.Target(), path + "/TyearEventPlot/" + list, 100));
+        }
+        return numbers;
+    };
+    EXPECT_EQ(numbersOf({"P3/MOM", "FRE/ML", "LN3/MOM/LBQI", "GEV/LMOM", "GEV/ML"}, 4),
+              numbersOf({"GEV/LMOM"}, 1));
+}
+
 TEST(ResultTree, HasZerosForWhatWasNotAskedFor) {
     const EngineRunOf run({}, "SLSCTest = true", "SLSCTest = false");
     const std::string item = "DistributionAnalysis/Item1/GoodnessOfFitStatistics";

@@ -1,6 +1,7 @@
 #include "stats/fit.h"
+#include "stats/jackknife.h"
 
-#include "unit/stats/named_combinations.h"
+#include "unit/stats/every_combination.h"
 
 #include <boost/math/quadrature/tanh_sinh.hpp>
 #include <gtest/gtest.h>
@@ -8,6 +9,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstddef>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -15,6 +18,7 @@
 namespace ryn::stats {
 namespace {
 
+using testing::AllNames;
 using testing::Named;
 
 const SeriesFrame kAnnual{};
@@ -49,10 +53,11 @@ std::vector<Subject> Subjects(const std::string& method) {
     return subjects;
 }
 
-// Those that need the sample skewness, or the values themselves.
-std::vector<Subject> LogNormalSubjects() {
-    std::vector<Subject> subjects;
-    for (const char* name : {"LN3/MOM/BI", "LN3/MOM/BII", "LN3/MOM/LBQII"}) {
+// Those that the lists by method do not have.
+std::vector<Subject> OtherSubjects() {
+    std::vector<Subject> subjects = {{"TGUM/ML", {SeriesKind::PartialDuration, 20, 2}}};
+    for (const char* name :
+         {"LN3/MOM/BI", "LN3/MOM/BII", "LN3/MOM/LBQII", "LN3/ML", "GUM/MOM corr"}) {
         subjects.push_back({name, kAnnual});
     }
     return subjects;
@@ -88,7 +93,10 @@ RC_GTEST_PROP(LMomentFit, ReproducesTheLMomentsOfTheSample, ()) {
     auto values = Sample(20);
     std::sort(values.begin(), values.end());
     const LMoments sample = LMomentsOfSorted(values);
-    for (const Subject& subject : Subjects("/LMOM")) {
+    RC_PRE(std::abs(sample.LSkewness()) > 1e-4); // Pearson 3 has no less
+    auto subjects = Subjects("/LMOM");
+    subjects.push_back({"LN2/LMOM", kAnnual});
+    for (const Subject& subject : subjects) {
         const auto fit = Estimated(subject, values);
         if (!fit || !IsLightTailed(fit->distribution, -0.7)) {
             continue;
@@ -114,6 +122,7 @@ RC_GTEST_PROP(MomentFit, ReproducesTheMomentsOfTheSample, ()) {
     const double s = sample.StandardDeviation();
     RC_PRE(std::abs(sample.Skewness()) > 0.001); // Pearson 3 has no less
     auto subjects = Subjects("/MOM");
+    subjects.push_back({"LN2/MOM", kAnnual});
     subjects.push_back({"LN3/MOM/BI", kAnnual});
     for (const Subject& subject : subjects) {
         const auto fit = Estimated(subject, values);
@@ -137,6 +146,19 @@ RC_GTEST_PROP(MomentFit, ReproducesTheMomentsOfTheSample, ()) {
     }
 }
 
+// On a level at which the tail is light enough for the variance to be integrated.
+RC_GTEST_PROP(MomentFit, OfFrechetReproducesMeanAndVariance, ()) {
+    const auto values = Sample(3000);
+    const CentralMoments sample = CentralMomentsOf(values);
+    const auto fit = Estimated({"FRE/MOM", kAnnual}, values);
+    RC_ASSERT(fit);
+    const double mean = Mean(fit->distribution, [](double, double x) { return x; });
+    RC_ASSERT(std::abs(mean - sample.mean) < 1e-9 * sample.mean);
+    const double variance =
+        Mean(fit->distribution, [=](double, double x) { return (x - mean) * (x - mean); });
+    RC_ASSERT(std::abs(variance - sample.Variance()) < 1e-6 * sample.Variance());
+}
+
 // x -> offset + factor x, thresholds alike: the fitted quantiles go along.
 RC_GTEST_PROP(Fit, FollowsShiftAndScaleOfTheSample, ()) {
     const auto values = Sample(20);
@@ -147,7 +169,7 @@ RC_GTEST_PROP(Fit, FollowsShiftAndScaleOfTheSample, ()) {
         x = offset + factor * x;
     }
     for (const auto& subjects :
-         {Subjects("/MOM"), Subjects("/ML"), Subjects("/LMOM"), LogNormalSubjects()}) {
+         {Subjects("/MOM"), Subjects("/ML"), Subjects("/LMOM"), OtherSubjects()}) {
         for (Subject subject : subjects) {
             const auto before = Estimated(subject, values);
             subject.frame.threshold = offset + factor * subject.frame.threshold;
@@ -174,8 +196,8 @@ RC_GTEST_PROP(Fit, OfPositiveValuesFollowsTheirScale, ()) {
     for (double& x : scaled) {
         x *= factor;
     }
-    for (const char* name : {"FRE/MOM", "LN2/MOM", "LN2/LMOM", "LN3/MOM/LBQI", "LP3/MOM/LOG",
-                             "LP3/MOM/REAL", "LP3/LMOM"}) {
+    for (const char* name : {"FRE/MOM", "LN2/MOM", "LN2/ML", "LN2/LMOM", "LN3/MOM/LBQI",
+                             "LP3/MOM/LOG", "LP3/MOM/REAL", "LP3/LMOM", "SQE/ML"}) {
         const auto before = Estimated({name, kAnnual}, values);
         const auto after = Estimated({name, kAnnual}, scaled);
         RC_ASSERT(static_cast<bool>(before) == static_cast<bool>(after));
@@ -186,6 +208,48 @@ RC_GTEST_PROP(Fit, OfPositiveValuesFollowsTheirScale, ()) {
                           1e-7 * std::abs(expected) + 1e-9 * factor);
             }
         }
+    }
+}
+
+// The jackknife by its definition, with a fit of each shortened sample. Mean and deviation of the
+// quantiles at `probability`, or nothing when a sample could not be fitted.
+std::optional<ResampledQuantile>
+NaiveJackknife(const Subject& subject, const std::vector<double>& values, double probability) {
+    std::vector<double> quantiles;
+    for (std::size_t i = 0; i < values.size(); ++i) {
+        auto rest = values;
+        rest.erase(rest.begin() + static_cast<std::ptrdiff_t>(i));
+        const auto fit = Estimated(subject, rest);
+        if (!fit) {
+            return std::nullopt;
+        }
+        quantiles.push_back(Quantile(fit->distribution, probability));
+    }
+    const CentralMoments spread = CentralMomentsOf(quantiles);
+    const auto n = static_cast<double>(values.size());
+    const double estimate = Quantile(Estimated(subject, values)->distribution, probability);
+    return ResampledQuantile{estimate, n * estimate - (n - 1) * spread.mean,
+                             std::sqrt((n - 1) * spread.m2), (n - 1) * (spread.mean - estimate)};
+}
+
+RC_GTEST_PROP(Jackknife, IsThatOfItsDefinitionForEveryCombination, ()) {
+    auto values = Sample(20);
+    values.resize(std::min<std::size_t>(values.size(), 15));
+    const std::vector<double> probabilities = {0.99};
+    for (const auto& [name, kind, combination] : testing::EveryCombination()) {
+        const Subject subject{name, {kind, kind == SeriesKind::PartialDuration ? 19.0 : 0.0, 2}};
+        const auto fit = Estimated(subject, values);
+        const auto expected = fit ? NaiveJackknife(subject, values, 0.99) : std::nullopt;
+        if (!expected || !std::isfinite(expected->standardDeviation)) {
+            continue;
+        }
+        const auto found = Jackknife(combination, fit->distribution, {values, subject.frame},
+                                     {.probabilities = probabilities});
+        RC_ASSERT(found.kept == values.size());
+        const ResampledQuantile& at = found.atProbabilities[0];
+        const double slack = 1e-8 * (expected->standardDeviation + std::abs(expected->estimate));
+        RC_ASSERT(std::abs(at.average - expected->average) < slack);
+        RC_ASSERT(std::abs(at.standardDeviation - expected->standardDeviation) < slack);
     }
 }
 
@@ -223,34 +287,25 @@ RC_GTEST_PROP(LogPearsonThreeFit, ReproducesTheMomentsInRealSpace, ()) {
     }
 }
 
-RC_GTEST_PROP(Fit, DoesNotDependOnTheOrderOfTheSample, ()) {
+RC_GTEST_PROP(Fit, ChangesInNoBitWithTheOrderOfTheSample, ()) {
     const auto values = Sample(20);
-    auto sorted = values;
-    std::sort(sorted.begin(), sorted.end());
-    auto sorting = Subjects("/LMOM");
-    sorting.push_back({"LP3/LMOM", kAnnual});
-    sorting.push_back({"LN3/MOM/LBQII", kAnnual});
-    for (const Subject& subject : sorting) {
-        FitScratch scratch;
-        const Combination c = Named(subject.name);
-        const auto first = EstimateParameters(c, {values, subject.frame}, scratch);
-        const auto second =
-            EstimateParameters(c, {sorted, subject.frame, ValueOrder::Ascending}, scratch);
-        RC_ASSERT(static_cast<bool>(first) == static_cast<bool>(second));
-        if (first) {
-            RC_ASSERT(Quantile(first->distribution, 0.99) == Quantile(second->distribution, 0.99));
-        }
-    }
-    for (const char* method : {"/MOM", "/ML"}) {
-        for (const Subject& subject : Subjects(method)) {
-            const auto first = Estimated(subject, values);
-            const auto second = Estimated(subject, sorted);
+    auto reversed = values;
+    std::reverse(reversed.begin(), reversed.end());
+    for (const std::string& name : AllNames()) {
+        for (const SeriesFrame& frame :
+             {kAnnual, SeriesFrame{SeriesKind::PartialDuration, 20, 2}}) {
+            const FitResult first = Fit(Named(name), {values, frame});
+            const FitResult second = Fit(Named(name), {reversed, frame});
             RC_ASSERT(static_cast<bool>(first) == static_cast<bool>(second));
-            if (first) {
-                const double quantile = Quantile(first->distribution, 0.99);
-                RC_ASSERT(std::abs(Quantile(second->distribution, 0.99) - quantile) <
-                          1e-9 * std::abs(quantile));
+            if (!first) {
+                RC_ASSERT(FailureText(first.Failure()) == FailureText(second.Failure()));
+                continue;
             }
+            for (std::size_t i = 0; i < first->parameters.size(); ++i) {
+                RC_ASSERT(first->parameters[i].value == second->parameters[i].value);
+            }
+            RC_ASSERT(first->logLikelihood == second->logLikelihood ||
+                      (std::isnan(first->logLikelihood) && std::isnan(second->logLikelihood)));
         }
     }
 }

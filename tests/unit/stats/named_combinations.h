@@ -64,6 +64,20 @@ inline Combination Named(const std::string& name) {
     return combination;
 }
 
+/// Every name that the two dialogs can make, and the Gumbel's with sample size correction.
+inline const std::vector<std::string>& AllNames() {
+    static const std::vector<std::string> names = {
+        "GEV/MOM",      "GEV/ML",    "GEV/LMOM",      "GUM/MOM",     "GUM/MOM corr", "GUM/ML",
+        "GUM/LMOM",     "WEI/MOM",   "WEI/LMOM",      "WEI2/MOM",    "WEI3/MOM",     "WEI2/ML",
+        "WEI2/LMOM",    "WEI3/LMOM", "FRE/MOM",       "GP/MOM",      "GP/LMOM",      "GP2/MOM",
+        "GP3/MOM",      "GP2/ML",    "GP2/LMOM",      "GP3/LMOM",    "P3/MOM",       "P3/LMOM",
+        "GAM/MOM",      "GAM/ML",    "GAM/LMOM",      "LP3/MOM/LOG", "LP3/MOM/REAL", "LP3/LMOM",
+        "LN2/MOM",      "LN2/ML",    "LN2/LMOM",      "LN3/MOM/BI",  "LN3/MOM/BII",  "LN3/ML",
+        "LN3/MOM/LBQI", "EXP1/MOM",  "LN3/MOM/LBQII", "EXP2/MOM",    "EXP1/ML",      "EXP1/LMOM",
+        "EXP2/LMOM",    "SQE/ML",    "TGUM/ML"};
+    return names;
+}
+
 /// How the reference series came from their records.
 inline SeriesFrame FrameOf(const std::string& series) {
     if (series == "rain40") {

@@ -1,7 +1,5 @@
 #include "stats/return_period.h"
 
-#include "unit/stats/reference_files.h"
-
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -11,7 +9,6 @@ namespace ryn::stats {
 namespace {
 
 using enum PeriodMeaning;
-using testing::HalfUnit;
 
 const SeriesFrame kAnnual{};
 const SeriesFrame kPeaks{SeriesKind::PartialDuration, 40, 44.0 / 48};
@@ -26,12 +23,6 @@ TEST(ExceedanceOfPeriod, OfAnAnnualMaximumSeriesIsItsInverse) {
 
 TEST(ExceedanceOfPeriod, OfPeaksTakesTheRateOrTheAnnualMaximum) {
     EXPECT_NEAR(ExceedanceOfPeriod(10, kPeaks, OfEvent), 48.0 / 440, 1e-16);
-    const double expected[] = {0.1149387444, 0.02203931707, 0.01096400275};
-    const double periods[] = {10, 50, 100};
-    for (int i = 0; i < 3; ++i) {
-        EXPECT_NEAR(ExceedanceOfPeriod(periods[i], kPeaks, OfAnnualMaximum), expected[i],
-                    HalfUnit(expected[i], 10));
-    }
     EXPECT_NEAR(ExceedanceOfPeriod(1e15, kPeaks, OfAnnualMaximum) * 1e15, 48.0 / 44, 1e-14);
 }
 
