@@ -3,7 +3,8 @@
 # make build     release programs in build/release/bin/
 # make sanitize  every test under the address and undefined-behaviour sanitizers
 # make lint      formatting, clang-tidy, the order of the folders
-# make bench     the speed table
+# make bench     the speed table, beside R and SciPy (installed where they are missing)
+# make coverage  how often the reported deviation holds the true 100-year event (two minutes)
 # make validation  every fit against the same fit in R; rewrites its tables in docs/methods.md.
 #                  PUBLISHED=DIR adds reference_fits.csv of that directory, with its series
 # make fuzz      each fuzz target for FUZZ_SECONDS seconds (default 600)
@@ -15,7 +16,7 @@ FUZZ_SECONDS ?= 600
 export CCACHE_BASEDIR := $(CURDIR)
 export CCACHE_NOHASHDIR := 1
 
-.PHONY: run test build sanitize lint bench validation fuzz format packages clean
+.PHONY: run test build sanitize lint bench coverage validation fuzz format packages clean
 .DEFAULT_GOAL := build
 
 packages:
@@ -47,6 +48,9 @@ format: packages
 
 bench: build
 	bench/run build/release/bin
+
+coverage: build
+	build/release/bin/ryn_coverage
 
 validation: build
 	@tools/install-packages tools/validation/packages.txt
