@@ -33,6 +33,13 @@ Transformed<N> Directly(const N& u, double kappa, double inverse) {
     return {t, r, r * inverseQ, k, (r * r - 2.0 * k) * inverse};
 }
 
+// Their limits at kappa = 0, where every walk begins.
+template <class N>
+Transformed<N> AtZero(const N& u) {
+    const N square = u * u;
+    return {u, u, u, 0.5 * square, 2.0 / 3 * square * u};
+}
+
 // The direct forms divide small differences by kappa; from |kappa| = 1e-3 on, what they lose around
 // h = kappa u = 0 is small against the sums. Nearer to 0 the power series
 //     t = u sum h^j/(j+1),  k = u^2 sum (j+1) h^j/(j+2),  kk = u^3 sum (j+1)(j+2) h^j/(j+3),
@@ -94,20 +101,32 @@ Sums<double> Total(const Sums<Pair>& pairs) {
             s.rr.Sum(),  s.rb.Sum(),  s.k.Sum(),      s.curve.Sum()};
 }
 
-// All the time of a fit goes here: two values at a time, in one loop for all sums.
-Sums<double> SumsOver(std::span<const double> fromEdge, double b, double kappa, double leastT) {
-    std::size_t i = 0;
-    Sums<double> sums;
-    if (std::abs(kappa) >= kSeriesShapes) {
-        const double inverse = 1 / kappa;
-        Sums<Pair> pairs;
-        for (; i + 1 < fromEdge.size(); i += 2) {
-            pairs.Add(Directly(b * Pair(fromEdge[i], fromEdge[i + 1]), kappa, inverse), leastT);
-        }
-        sums = Total(pairs);
+// Two values at a time, in one loop for all sums. An odd value is left over.
+template <class F>
+Sums<double> SumsOfPairs(std::span<const double> fromEdge, double b, double leastT, F&& transform) {
+    Sums<Pair> pairs;
+    for (std::size_t i = 0; i + 1 < fromEdge.size(); i += 2) {
+        pairs.Add(transform(b * Pair(fromEdge[i], fromEdge[i + 1])), leastT);
     }
-    for (; i < fromEdge.size(); ++i) {
-        sums.Add(Transform(b * fromEdge[i], kappa), leastT);
+    return Total(pairs);
+}
+
+// All the time of a fit goes here.
+Sums<double> SumsOver(std::span<const double> fromEdge, double b, double kappa, double leastT) {
+    Sums<double> sums;
+    if (kappa == 0) {
+        sums = SumsOfPairs(fromEdge, b, leastT, [](const Pair& u) { return AtZero(u); });
+    } else if (std::abs(kappa) >= kSeriesShapes) {
+        sums = SumsOfPairs(fromEdge, b, leastT, [kappa, inverse = 1 / kappa](const Pair& u) {
+            return Directly(u, kappa, inverse);
+        });
+    } else {
+        for (const double d : fromEdge.first(fromEdge.size() / 2 * 2)) {
+            sums.Add(Transform(b * d, kappa), leastT);
+        }
+    }
+    if (fromEdge.size() % 2 == 1) {
+        sums.Add(Transform(b * fromEdge.back(), kappa), leastT);
     }
     return sums;
 }
@@ -209,8 +228,19 @@ void GevProfile::GoBackTo(double kappa) {
     }
 }
 
+// What a walk knows of the path may be too coarse to start from; the path is then met at the place
+// itself.
 std::optional<GevProfile::Maximum> GevProfile::MaximumNear(double kappa) {
     GoBackTo(kappa);
+    auto maximum = MaximumFrom(kappa);
+    if (!maximum) {
+        (*this)(kappa);
+        maximum = MaximumFrom(kappa);
+    }
+    return maximum;
+}
+
+std::optional<GevProfile::Maximum> GevProfile::MaximumFrom(double kappa) const {
     double b = ScaleAt(ExpectedLogT(kappa), kappa);
     for (int pass = 0; pass < 8; ++pass) {
         const Surface at = SurfaceAt(b, kappa);

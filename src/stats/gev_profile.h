@@ -85,6 +85,7 @@ class GevProfile {
 
     double ExpectedLogT(double kappa) const;
     void GoBackTo(double kappa);
+    std::optional<Maximum> MaximumFrom(double kappa) const;
     Surface SurfaceAt(double b, double kappa) const;
     double ScaleAt(double logT, double kappa) const;
     Sight Look(double logT, double kappa) const;
