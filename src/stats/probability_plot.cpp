@@ -19,9 +19,18 @@ double Mean(std::span<const double> values) {
     return sum / static_cast<double>(values.size());
 }
 
+// Both lists are monotone, so that their ends tell. The deviations of equal values would not: their
+// mean may be off by a rounding, which correlates with anything.
+bool HasSpread(std::span<const double> values) {
+    return !values.empty() && values.front() != values.back();
+}
+
 // Pearson's, by deviations from the means. A term that is not finite makes a sum that is not, and
 // so does one whose square overflows; rounding must not leave a correlation above 1.
 double Correlation(std::span<const double> x, std::span<const double> y) {
+    if (!HasSpread(x) || !HasSpread(y)) {
+        return kNaN;
+    }
     const double meanX = Mean(x);
     const double meanY = Mean(y);
     double xx = 0;
@@ -72,9 +81,11 @@ LeastSquaresCriterion LeastSquaresCriterionOf(const Distribution& d, const Proba
     result.highVariate = StandardVariate(d, Quantile(d, 0.99));
     const double squared =
         std::visit([&](const auto& family) { return MeanSquaredDifference(family, plot); }, d);
-    // Infinite variates cancel to NaN or stay infinite; neither is a criterion.
-    const double criterion = std::sqrt(squared) / std::abs(result.highVariate - result.lowVariate);
-    result.criterion = std::isfinite(criterion) ? criterion : kNaN;
+    // Infinite variates cancel to NaN or stay infinite; neither is a criterion. An infinite scale,
+    // as where the quantile of 0.01 is below all doubles, would make any fit a perfect one.
+    const double scale = std::abs(result.highVariate - result.lowVariate);
+    const double criterion = std::sqrt(squared) / scale;
+    result.criterion = std::isfinite(criterion) && std::isfinite(scale) ? criterion : kNaN;
     return result;
 }
 

@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
+#include <numeric>
 #include <string>
 #include <vector>
 
@@ -85,6 +86,27 @@ TEST(GoodnessOfFit, HasNoStatisticWhereTheSampleHasNone) {
     const ProbabilityPlot far = ProbabilityPlotOf(d, huge, PlottingMethod::Hazen);
     EXPECT_TRUE(std::isnan(LeastSquaresCriterionOf(d, far).criterion));
     EXPECT_TRUE(std::isnan(PlotCorrelation(far)));
+}
+
+// So skewed that the quantile of 0.01 is exp(-1200): no double holds it, and its variate is
+// infinite.
+TEST(GoodnessOfFit, HasNoCriterionOnAnInfiniteScale) {
+    const Distribution d = *LogPearsonThree::Make({5.18, -280, 0.35});
+    const std::vector<double> sample{0.16, 0.18, 0.96, 1.96, 2.3, 13.3, 155};
+    const ProbabilityPlot plot = ProbabilityPlotOf(d, sample, PlottingMethod::Weibull);
+    const LeastSquaresCriterion criterion = LeastSquaresCriterionOf(d, plot);
+    EXPECT_TRUE(std::isinf(criterion.lowVariate));
+    EXPECT_TRUE(std::isnan(criterion.criterion));
+}
+
+// A scale far below the location's last digit: all quantiles are one number, whose mean rounds.
+TEST(GoodnessOfFit, HasNoCorrelationWithQuantilesThatAreAllEqual) {
+    const Distribution d = *Gumbel::Make({9.991785218826323, 1e-20});
+    std::vector<double> sample(500);
+    std::iota(sample.begin(), sample.end(), 1.0);
+    const ProbabilityPlot plot = ProbabilityPlotOf(d, sample, PlottingMethod::Weibull);
+    ASSERT_EQ(plot.quantiles.front(), plot.quantiles.back());
+    EXPECT_TRUE(std::isnan(PlotCorrelation(plot)));
 }
 
 // Values of the limit distribution from its defining sum in 50 digits.
