@@ -5,6 +5,7 @@
 #include <cstdlib>
 
 #include "grid/delete_value.h"
+#include "netcdf/nc_values.h"
 
 namespace ryn {
 
@@ -61,11 +62,12 @@ float FirstLevel(const NcFile& file, const GridVariable& item) {
         return 0.0F;
     const int dimension = item.variable->dimensions[item.layerPlaces[0]];
     const NcVariable* const levels = CoordinatesOf(file, dimension);
-    double value = 0.0;
-    if (levels != nullptr &&
-        !file.Read(*levels, std::array{std::size_t{0}}, std::array{std::size_t{1}}, &value))
+    float value = 0.0F;
+    if (levels == nullptr ||
+        !NcValues(&file, levels)
+             .Read(std::array{std::size_t{0}}, std::array{std::size_t{1}}, &value))
         return 0.0F;
-    return std::isfinite(value) ? static_cast<float>(value) : 0.0F;
+    return std::isfinite(value) ? value : 0.0F;
 }
 
 GridItem DescribeItem(const NcFile& file, const GridVariable& item) {
