@@ -32,6 +32,7 @@ std::vector<float> MarksOf(const NcFile& file, const NcVariable& variable) {
 float ChooseDeleteValue(const NcFile& file, const std::vector<GridVariable>& items) {
     constexpr float kFloatFill = 9.9692099683868690e+36F;
     std::vector<std::vector<float>> others;
+    others.reserve(items.size());
     for (const GridVariable& item : items)
         others.push_back(MarksOf(file, *item.variable));
     for (const float mark : others.front()) {

@@ -10,6 +10,7 @@
 #include "base/qx_date_time.h"
 #include "base/status.h"
 #include "grid/grid_records.h"
+#include "units/units.h"
 
 /// Two-dimensional grids in time, from CF netCDF files as they come: classic, CDF-5 and netCDF-4;
 /// time and the axes of space in any order; packed values; any CF time. docs/formats/grid.md says
@@ -45,8 +46,8 @@ class CGridEditItemInfo {
     int Layers() const { return layers; }
 
   private:
-    int itemType = 999;
-    int unit = 0;
+    int itemType = kItemTypeUndefined;
+    int unit = kUnitUndefined;
     int layers = 1;
     std::string name;
 };
@@ -155,10 +156,12 @@ class CGridEditEngine {
     EGridEditErrors CloseFile();
 
     /// Cuts a part of the grid into tiles with all its steps, each of which ReadTile reads with no
-    /// more than `memoryLimit` bytes, its result included. No chunk of the file is cut between two
+    /// more than `memoryLimit` bytes, its result included (the netCDF library keeps some 16 MiB of
+    /// unpacked chunks besides). No chunk of the file is cut between two
     /// tiles unless its places alone exceed the limit, so that each is decompressed once; what is
-    /// not chunked is cut so that tiles lie in long runs. Refused when the limit does not hold one
-    /// point.
+    /// not chunked is cut so that tiles lie in long runs. (A file with one chunk for each step has
+    /// to be unpacked once for each tile, whatever is done.) Refused when the limit does not hold
+    /// one point.
     EGridEditErrors PlanTiles(const GridTile& whole, std::size_t memoryLimit,
                               std::vector<GridTile>* tiles);
     /// Reads a tile point by point: the steps of a point lie together, and point (firstX + i,

@@ -172,15 +172,15 @@ Status GridFile::Summarise(int item, int layer, GridSummary* summary) const {
     const GridBox box{
         {Run{0, Size(steps)}, Run{0, Size(layout.y.size)}, Run{0, Size(layout.x.size)}}};
     BlockReader reader(file, Item(item), layer);
-    const Status status = reader.ForEachBlock(
-        box, kMostScratch, [&found](const GridBox&, std::span<const float> values) {
-            found.values += values.size();
-            for (const float value : values) {
-                found.missing += std::isnan(value) ? 1 : 0;
-                found.smallest = std::min(found.smallest, value);
-                found.largest = std::max(found.largest, value);
-            }
-        });
+    Status status = reader.ForEachBlock(box, kMostScratch,
+                                        [&found](const GridBox&, std::span<const float> values) {
+                                            found.values += values.size();
+                                            for (const float value : values) {
+                                                found.missing += std::isnan(value) ? 1 : 0;
+                                                found.smallest = std::min(found.smallest, value);
+                                                found.largest = std::max(found.largest, value);
+                                            }
+                                        });
     if (!status)
         return status;
     if (found.missing == found.values)

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <climits>
+#include <cstdint>
 #include <optional>
 #include <set>
 #include <sstream>
@@ -162,6 +163,8 @@ class Finder {
         for (const NcVariable* const variable : candidates) {
             if (Has(*variable, plane.x) && Has(*variable, plane.y)) {
                 GridVariable item;
+                if (Status status = CheckChunk(*variable); !status)
+                    return status;
                 if (Status status = Describe(*variable, plane, &item); !status)
                     return status;
                 layout.items.push_back(std::move(item));
@@ -170,6 +173,18 @@ class Finder {
             }
         }
         return Status::Ok();
+    }
+
+    /// The library allocates a chunk as its header states it.
+    Status CheckChunk(const NcVariable& variable) const {
+        constexpr std::uint64_t kUnsuspicious = std::uint64_t{64} << 20;
+        auto bytes = static_cast<std::uint64_t>(BytesOf(variable.type));
+        for (const std::size_t length : file.ChunkShape(variable))
+            if (__builtin_mul_overflow(bytes, length, &bytes))
+                return file.InputFault(variable, "has chunks of an impossible size");
+        return bytes <= kUnsuspicious || bytes / kMostExpansion <= file.FileSize()
+                   ? Status::Ok()
+                   : file.InputFault(variable, "has chunks larger than the file can hold");
     }
 
     Status Describe(const NcVariable& variable, const Plane& plane, GridVariable* item) const {
@@ -211,7 +226,7 @@ class Finder {
 
 Status FindGrid(const NcFile& file, GridLayout* layout) {
     GridLayout found;
-    const Status status = Finder(file, &found).Find();
+    Status status = Finder(file, &found).Find();
     if (status)
         *layout = std::move(found);
     return status;

@@ -13,7 +13,6 @@ constexpr std::size_t kScratchBytes = std::size_t{16} << 20;
 /// The plane is allocated whole: it must be one that the file can hold.
 Status CheckPlane(const GridFile& grid, std::size_t cells) {
     constexpr std::size_t kUnsuspicious = std::size_t{1} << 22;
-    constexpr std::size_t kMostExpansion = 1100;
     if (cells > kUnsuspicious && cells / kMostExpansion > grid.File().FileSize())
         return grid.File().InputFault("a plane counts more values than the file can hold");
     return Status::Ok();
@@ -44,7 +43,7 @@ Status SliceCache::Fill(const GridFile& grid, const GridTile& request) {
     }
     Clear();
     values.resize(wanted.Values());
-    const Status status = grid.ReadPlanes(wanted, kScratchBytes, values);
+    Status status = grid.ReadPlanes(wanted, kScratchBytes, values);
     if (status)
         held = wanted;
     return status;

@@ -83,8 +83,6 @@ void Judge(AxisRole role, SpatialAxis* axis, bool isRotated) {
 } // namespace
 
 Status CheckHoldable(const NcFile& file, const NcVariable& variable) {
-    // The most that deflate makes of equal bytes, and a little more.
-    constexpr std::uint64_t kMostExpansion = 1100;
     std::uint64_t bytes = static_cast<std::uint64_t>(BytesOf(variable.type));
     for (std::size_t i = 0; i < variable.dimensions.size(); ++i)
         if (__builtin_mul_overflow(bytes, file.DimensionOf(variable, i).length, &bytes))

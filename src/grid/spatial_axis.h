@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 #include <vector>
 
@@ -33,6 +34,10 @@ struct SpatialAxis {
 /// Reads the axis along a dimension. A longitude axis that passes 360 or 180 degrees is continued
 /// beyond. The fault names the file.
 Status ReadSpatialAxis(const NcFile& file, int dimension, AxisRole role, SpatialAxis* axis);
+
+/// The most that deflate makes of equal bytes, and a little more: a file of N bytes holds at most
+/// N times this.
+inline constexpr std::uint64_t kMostExpansion = 1100;
 
 /// Refuses a variable with more values than a file of its size can hold, however compressed.
 Status CheckHoldable(const NcFile& file, const NcVariable& variable);

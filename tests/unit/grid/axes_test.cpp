@@ -165,6 +165,55 @@ TEST(GridAxes, OfARotatedPoleRunByPlaceNumberAndTurnTheirCells) {
     EXPECT_THAT(real.latitudes, ElementsAre(53, 54, 55, 50, 51, 52));
 }
 
+TEST(GridAxes, WithCellsThatMayMoveHaveThoseOfTheFirstStep) {
+    NetcdfSample file(GridPath("moving"));
+    file.Dimension("Time", 2).Dimension("south_north", 1).Dimension("west_east", 2);
+    file.Variable("XTIME", NC_FLOAT, {"Time"});
+    file.Text("XTIME", "units", "minutes since 2000-01-01 00:00:00");
+    for (const std::string& degrees : {std::string("XLAT"), std::string("XLONG")})
+        file.Variable(degrees, NC_FLOAT, {"Time", "south_north", "west_east"})
+            .Text(degrees, "units", degrees == "XLAT" ? "degree_north" : "degree_east")
+            .Text(degrees, "coordinates", "XLONG XLAT");
+    file.Variable("T2", NC_FLOAT, {"Time", "south_north", "west_east"});
+    file.Text("T2", "coordinates", "XLONG XLAT XTIME").Values("XTIME", {0, 180});
+    file.Values("XLAT", {50, 51, 60, 61}).Values("XLONG", {1, 2, 3, 4});
+    file.Values("T2", {280, 281, 290, 291});
+    OpenGrid grid(file.Finish());
+    ASSERT_EQ(grid.header.Items(), 1);
+    EXPECT_EQ(grid.header.DynamicItem(1).GetName(), "T2");
+    EXPECT_EQ(grid.header.TimeStep(), 10800.0);
+    EXPECT_EQ(grid.At(1, 0, 1), 291.0F);
+    GridCoordinates real;
+    EXPECT_EQ(grid.engine.ReadCoordinates(&real), kGridOk);
+    EXPECT_THAT(real.latitudes, ElementsAre(50, 51));
+    EXPECT_THAT(real.longitudes, ElementsAre(1, 2));
+}
+
+TEST(GridAxes, OfAProjectionRunInItsLengths) {
+    SampleGrid sample;
+    sample.xName = "x";
+    sample.yName = "y";
+    sample.x = {0, 1000, 2000, 3000};
+    sample.y = {7000, 6000, 5000};
+    sample.order = {"time", "y", "x"};
+    sample.define = [](NetcdfSample& file) {
+        file.Text("x", "units", "m").Text("y", "units", "metre").Variable("crs", NC_INT, {});
+        file.Text("crs", "grid_mapping_name", "lambert_conformal_conic");
+        file.Number("crs", "longitude_of_central_meridian", 10.5);
+        file.Number("crs", "latitude_of_projection_origin", 52.0);
+        file.Text("q", "grid_mapping", "crs");
+    };
+    OpenGrid grid(sample.Write("projected"));
+    EXPECT_FALSE(grid.header.RunsByIndex());
+    EXPECT_EQ(grid.header.QtyUnit(), UnitOfText("m"));
+    EXPECT_EQ(grid.header.DX(), 1000.0F);
+    EXPECT_EQ(grid.header.Y0(), 5000.0F);
+    EXPECT_EQ(grid.header.MapProjection(), "lambert_conformal_conic");
+    EXPECT_EQ(grid.header.Longitude(), 10.5);
+    EXPECT_EQ(grid.header.Latitude(), 52.0);
+    EXPECT_EQ(grid.header.Rotation(), 0.0);
+}
+
 TEST(GridAxes, OfLevelsAndMembersMakeLayers) {
     NetcdfSample file(GridPath("levels"), NC_NETCDF4);
     file.Dimension("time", 1).Dimension("member", 2).Dimension("lev", 3);

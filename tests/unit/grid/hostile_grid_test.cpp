@@ -97,6 +97,15 @@ TEST(HostileGrid, WithAnAxisLongerThanItselfIsRefused) {
     EXPECT_EQ(GridRefusal(file.Finish()), "\"lon\" counts more values than the file can hold");
 }
 
+TEST(HostileGrid, WithAChunkLargerThanItCanHoldIsRefused) {
+    NetcdfSample file(GridPath("large_chunk"), NC_NETCDF4);
+    file.Dimension("time", NC_UNLIMITED).Dimension("lat", 2).Dimension("lon", 2);
+    file.Variable("time", NC_INT, {"time"}).Text("time", "units", "days since 2000-01-01");
+    file.Chunks("time", {1}).Variable("q", NC_FLOAT, {"time", "lat", "lon"});
+    file.Chunks("q", {100000000, 2, 2}).Values("time", {0, 1});
+    EXPECT_EQ(GridRefusal(file.Finish()), "\"q\" has chunks larger than the file can hold");
+}
+
 TEST(HostileGrid, WithNamesOfSeveralLinesGivesOneLine) {
     NetcdfSample file(GridPath("odd_names"));
     file.Dimension("time", 1).Dimension("a\"b", 2);
