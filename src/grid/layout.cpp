@@ -15,7 +15,6 @@ namespace {
 struct Plane {
     int y = 0; ///< places in NcFile::Dimensions
     int x = 0;
-    friend bool operator==(const Plane&, const Plane&) = default;
 };
 
 bool Has(const NcVariable& variable, int dimension) {
