@@ -31,6 +31,8 @@ constexpr std::array kStandardNames = std::to_array<RoleOfWord>({
     {" height altitude depth air_pressure model_level_number ", AxisRole::Level},
 });
 
+/// What ocean, weather and regional models call the dimensions of files without coordinate
+/// variables.
 constexpr std::array kDimensionNames = std::to_array<RoleOfWord>({
     {" x lon long longitude rlon xc nx ni i easting nlon xi_rho west_east ", AxisRole::X},
     {" y lat latitude rlat yc ny nj j northing nlat eta_rho south_north ", AxisRole::Y},
@@ -77,6 +79,8 @@ bool IsAlong(const NcFile& file, const NcVariable& variable, int dimension) {
 } // namespace
 
 AxisRole RoleOfCoordinates(const NcFile& file, const NcVariable& variable) {
+    // In the order of how seldom each is wrong: `axis` exists only to say this, while a `positive`
+    // direction is told of depths that are data, too.
     if (const AxisRole role = RoleIn(kAxisWords, TextOf(file, variable, "axis"));
         role != AxisRole::None)
         return role;
@@ -96,6 +100,7 @@ const NcVariable* CoordinatesOf(const NcFile& file, int dimension) {
     const NcVariable* const named = file.FindVariable(name);
     if (named != nullptr && IsAlong(file, *named, dimension))
         return named;
+    // Files with dimensions of their own names (nlat, nlon) have the coordinates beside them.
     const NcVariable* found = nullptr;
     for (const NcVariable& variable : file.Variables()) {
         if (!IsAlong(file, variable, dimension))

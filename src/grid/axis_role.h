@@ -5,7 +5,12 @@
 namespace ryn {
 
 /// What a dimension, or a variable with its coordinates, measures.
-enum class AxisRole { None, X, Y, Level };
+enum class AxisRole {
+    None,  ///< nothing that is known: members, stations, corners
+    X,     ///< longitude, or the projection's or grid's own x
+    Y,     ///< latitude, and so on
+    Level, ///< height, depth, pressure
+};
 
 /// By the attributes of CF (`axis`, `standard_name`, `units`, `positive`) and of the Unidata
 /// conventions (`_CoordinateAxisType`).

@@ -20,6 +20,7 @@ BlockReader::BlockReader(const NcFile& file, const GridVariable& item, int layer
         file.Number(variable->id, "scale_factor") || file.Number(variable->id, "add_offset");
     if (variable->type != NcType::Float || isScaled)
         bytesOfValue += sizeof(double);
+    // A layer's number counts the last of its dimensions fastest.
     auto rest = static_cast<std::size_t>(layer);
     for (std::size_t i = item.layerPlaces.size(); i-- > 0;) {
         const std::size_t length = file.DimensionOf(*variable, item.layerPlaces[i]).length;
@@ -74,6 +75,8 @@ Status BlockReader::Read(const GridBox& box, const GridTarget& target, std::size
     });
 }
 
+/// Walks the block as it lies in memory; only the writing jumps, within a block that was kept
+/// small.
 void BlockReader::Scatter(const GridBox& block, const GridTarget& target) const {
     const float* from = values.data();
     const auto along = [&](std::size_t i) {

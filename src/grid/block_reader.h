@@ -10,10 +10,11 @@
 
 namespace ryn {
 
-/// Time, y and x, in this order.
+/// Three lengths or places: of time, y and x, in this order, unless said otherwise.
 using Triple = std::array<std::size_t, 3>;
 
-/// A box of one layer, in places of the file.
+/// A box of one layer: runs along time, y and x, in places of the file, where a turned axis still
+/// runs backwards.
 struct GridBox {
     std::array<Run, 3> runs;
 };

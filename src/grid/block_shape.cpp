@@ -38,6 +38,7 @@ std::vector<std::size_t> BlockShape(Lengths chunk, Lengths extent, std::size_t b
     std::vector<std::size_t> shape;
     for (std::size_t i = 0; i < extent.size(); ++i)
         shape.push_back(std::max<std::size_t>(1, std::min(chunk[i], extent[i])));
+    // What must be unpacked together is read together, be it across the file's order.
     const std::vector<std::size_t> whole = shape;
     CutToBudget(&shape, extent, budget);
     // Of a cut chunk nothing may grow: the other parts would only be read again.

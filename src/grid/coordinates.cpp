@@ -53,6 +53,7 @@ class CellReader {
 } // namespace
 
 Status GridFile::ReadCoordinates(GridCoordinates* coordinates) const {
+    // All or nothing: half of the coordinates would be taken for those of another kind of grid.
     GridCoordinates read;
     read.x = AxisOf(layout.x);
     read.y = AxisOf(layout.y);

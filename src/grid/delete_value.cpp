@@ -15,7 +15,8 @@ bool IsPacked(const NcFile& file, const NcVariable& variable) {
            file.Number(variable.id, "add_offset").value_or(0.0) != 0.0;
 }
 
-/// What the values handed on show as missing, as floats.
+/// What the values handed on show as missing, as floats. A packed mark is none: unpacked it is a
+/// number like others, and as it stands in the file it may be data once unpacked.
 std::vector<float> MarksOf(const NcFile& file, const NcVariable& variable) {
     std::vector<float> marks;
     if (IsPacked(file, variable))

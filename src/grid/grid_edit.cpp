@@ -154,6 +154,9 @@ EGridEditErrors CGridEditEngine::GetSlice(CGridEditSlice& slice) {
         return Take(grid->File().InputFault("it has only the plane of x and y, and only items that "
                                             "change in time"),
                     kGridBadRequest);
+    if (slice.header.header != grid->Header())
+        return Take(grid->File().InputFault("the slice was not made for this file"),
+                    kGridBadRequest);
     const GridTile plane = grid->PlaneTile(slice.item, slice.layer, slice.step);
     if (Status status = grid->CheckTile(plane); !status)
         return Take(std::move(status), kGridBadRequest);

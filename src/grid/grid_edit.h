@@ -104,13 +104,17 @@ class CGridEditHeaderInfo {
     const std::vector<std::string>& Notes() const;
 
   private:
+    friend class CGridEditEngine;
+
     std::shared_ptr<const GridHeader> header;
 };
 
 /// The plane of one step. It chooses what CGridEditEngine::GetSlice reads, and holds what was read.
 class CGridEditSlice {
   public:
-    /// `plane` is 0: the plane of x and y, the only one there is. Any other makes GetSlice fail.
+    /// Empties the slice and binds it to the open file whose header this is: GetSlice fails for one
+    /// of another file. `plane` is 0, the plane of x and y, the only one there is; any other makes
+    /// GetSlice fail too. The choices fall back to item 1, layer 0, step 0.
     void Initilize(const CGridEditHeaderInfo& header, int plane);
     /// Items that change in time are all there are: false makes GetSlice fail.
     void SetDynamic(bool isDynamic);

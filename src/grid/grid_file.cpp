@@ -12,6 +12,7 @@ namespace ryn {
 
 namespace {
 
+// More than this makes reading no faster, and leaves less room for the tile itself.
 constexpr std::size_t kMostScratch = std::size_t{16} << 20;
 
 std::size_t Size(int count) {
@@ -93,6 +94,7 @@ Status GridFile::PlanTiles(const GridTile& whole, std::size_t limitBytes,
                                " bytes, does not hold the " + std::to_string(whole.countSteps) +
                                " steps of one point");
     const BlockReader reader(file, Item(whole.item), whole.layer);
+    // Tiles grow along the faster of the two first, whichever comes first in the file.
     const bool isXFaster = Item(whole.item).xPlace > Item(whole.item).yPlace;
     const Run x = RunOf(layout.x, whole.firstX, whole.countX);
     const Run y = RunOf(layout.y, whole.firstY, whole.countY);
@@ -154,6 +156,7 @@ Status GridFile::ReadPlanes(const GridTile& tile, std::size_t scratchBytes,
 
 int GridFile::PlanesTogether(int item) const {
     const BlockReader reader(file, Item(item), 0);
+    // Interleaved steps: reading one costs as much of the disk as reading all.
     if (reader.Order()[0] != 0 && reader.Chunk()[0] == 1)
         return std::numeric_limits<int>::max();
     return static_cast<int>(std::min(reader.Chunk()[0], header->milliseconds.size()));
@@ -167,6 +170,7 @@ Status GridFile::Summarise(int item, int layer, GridSummary* summary) const {
     if (Status status = CheckHoldable(file, *Item(item).variable); !status)
         return status;
     GridSummary found;
+    // A NaN loses every comparison, so missing values need no test of their own below.
     found.smallest = std::numeric_limits<float>::infinity();
     found.largest = -found.smallest;
     const GridBox box{

@@ -20,6 +20,7 @@ class GridFile {
     /// The fault is one line that names the file.
     static Status Open(const std::string& path, std::unique_ptr<GridFile>* file);
 
+    /// All three stay the same from opening on.
     const NcFile& File() const { return file; }
     const GridLayout& Layout() const { return layout; }
     const std::shared_ptr<const GridHeader>& Header() const { return header; }
@@ -40,6 +41,7 @@ class GridFile {
                       std::span<float> values) const;
     /// What of a memory limit the reading of a tile takes besides the tile.
     static std::size_t ScratchOf(std::size_t limitBytes);
+    /// Both as the engine's operations of these names.
     Status Summarise(int item, int layer, GridSummary* summary) const;
     Status ReadCoordinates(GridCoordinates* coordinates) const;
 

@@ -9,10 +9,11 @@
 
 namespace ryn {
 
+/// One item, as CGridEditItemInfo tells it.
 struct GridItem {
-    std::string name;
-    int type = kItemTypeUndefined;
-    int unit = kUnitUndefined;
+    std::string name;              ///< for people: ItemName
+    int type = kItemTypeUndefined; ///< what the unit suggests
+    int unit = kUnitUndefined;     ///< of the values
     int layers = 1;
 };
 
@@ -20,11 +21,11 @@ struct GridItem {
 struct GridHeader {
     std::vector<std::int64_t> milliseconds; ///< of each step, since 1970-01-01
     bool hasEqualSteps = false;
-    double stepSeconds = 0.0;
-    float deleteValue = 0.0F;
+    double stepSeconds = 0.0; ///< the mean where they differ
+    float deleteValue = 0.0F; ///< finite
     int sizeX = 0;
     int sizeY = 0;
-    bool runsByIndex = false;
+    bool runsByIndex = false; ///< origin 0 and spacing 1 then, and no unit
     float originX = 0.0F;
     float originY = 0.0F;
     float originZ = 0.0F;

@@ -21,6 +21,7 @@ struct GridTile {
     int firstStep = 0;
     int countSteps = 0;
 
+    /// Cells of the plane in the tile, and values in all.
     std::size_t Points() const {
         return static_cast<std::size_t>(countX) * static_cast<std::size_t>(countY);
     }
@@ -32,10 +33,10 @@ struct GridTile {
 /// does not have is empty.
 struct GridCoordinates {
     struct Axis {
-        std::string name;
-        std::string units;
+        std::string name;  ///< of the coordinate variable, else of the dimension
+        std::string units; ///< as in the file, and so the next
         std::string standardName;
-        std::vector<double> values;
+        std::vector<double> values; ///< one for each place
     };
     Axis x;
     Axis y;
@@ -44,10 +45,11 @@ struct GridCoordinates {
     std::vector<double> latitudes;
 };
 
+/// One axis of the plane.
 struct GridAxisDescription {
-    std::string name;
-    std::string units;
-    int size = 0;
+    std::string name;  ///< of the coordinate variable, else of the dimension
+    std::string units; ///< as in the file
+    int size = 0;      ///< places, 1 or more
     /// First and last coordinate, ascending; both 0 where the file has none.
     double first = 0.0;
     double last = 0.0;
@@ -55,14 +57,15 @@ struct GridAxisDescription {
     bool isTurned = false; ///< the file has it descending
 };
 
+/// One item.
 struct GridItemDescription {
-    int number = 1;
+    int number = 1;       ///< as CGridEditSlice::SetItem takes it
     std::string name;     ///< `long_name`, else the variable's
     std::string variable; ///< name in the file
-    std::string units;
-    std::string type; ///< text of the item type
-    int layers = 1;
-    std::string storage; ///< dimensions in the file's order, slowest first: "time, lat, lon"
+    std::string units;    ///< as in the file
+    std::string type;     ///< text of the item type
+    int layers = 1;       ///< counted from 0
+    std::string storage;  ///< dimensions in the file's order, slowest first: "time, lat, lon"
 };
 
 /// What there is to say of a grid file.

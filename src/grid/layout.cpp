@@ -38,6 +38,8 @@ class Finder {
   public:
     Finder(const NcFile& source, GridLayout* result) : file(source), layout(*result) {}
 
+    /// Cheap tests come first, so that a file of another kind is told by what it lacks and not by a
+    /// fault of its times.
     Status Find() {
         const NcVariable* const time = FindTimeVariable(file);
         if (time == nullptr)
@@ -140,6 +142,7 @@ class Finder {
             return status;
         layout.longitudes = FindCells(plane, AxisRole::X);
         layout.latitudes = FindCells(plane, AxisRole::Y);
+        // One without the other places nothing.
         if (layout.longitudes == nullptr || layout.latitudes == nullptr)
             layout.longitudes = layout.latitudes = nullptr;
         return Status::Ok();

@@ -23,6 +23,7 @@ void JudgeSteps(GridHeader* header) {
     const double step =
         static_cast<double>(times.back() - times.front()) / static_cast<double>(times.size() - 1);
     header->stepSeconds = step / 1000.0;
+    // Against the rule and not against the step before: small shifts must not add up.
     for (std::size_t i = 0; i < times.size(); ++i) {
         const double ruled = static_cast<double>(i) * step;
         if (std::abs(static_cast<double>(times[i] - times.front()) - ruled) > 1.0)
@@ -30,7 +31,8 @@ void JudgeSteps(GridHeader* header) {
     }
 }
 
-/// The code of the axes' unit when they run by coordinate and share one.
+/// The code of the axes' unit when they run by coordinate and share one. A file of results has one
+/// unit for both, so axes of two (degrees across, metres up) cannot run by coordinate.
 bool ShareUnit(const GridLayout& layout, int* unit) {
     if (layout.x.isGeographic != layout.y.isGeographic)
         return false;

@@ -23,6 +23,7 @@ std::string FirstText(const NcFile& file, int variable, std::span<const char* co
 } // namespace
 
 MapProjection ReadMapProjection(const NcFile& file, const GridLayout& layout) {
+    // Well-known text first: it says the most, and other programs take it as it is.
     constexpr std::array kTexts = {"crs_wkt", "spatial_ref", "grid_mapping_name"};
     constexpr std::array kLongitudes = {"longitude_of_projection_origin",
                                         "longitude_of_central_meridian",

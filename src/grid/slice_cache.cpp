@@ -37,10 +37,12 @@ Status SliceCache::Fill(const GridFile& grid, const GridTile& request) {
     const int together = static_cast<int>(std::min<std::size_t>(
         fitting, static_cast<std::size_t>(grid.PlanesTogether(request.item))));
     GridTile wanted = request;
-    if (together > 1) {
+    if (together > 1) { // from where the chunk begins, so that walking back is served as well
         wanted.firstStep = request.firstStep / together * together;
         wanted.countSteps = std::min(together, steps - wanted.firstStep);
     }
+    // Emptied first: on failure it must not pass for what it held, and two sets of planes at once
+    // would double the memory.
     Clear();
     values.resize(wanted.Values());
     Status status = grid.ReadPlanes(wanted, kScratchBytes, values);

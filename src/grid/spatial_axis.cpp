@@ -25,6 +25,7 @@ void ContinueCircle(std::vector<double>* longitudes) {
         return;
     const double step = std::remainder(values[1] - values[0], 360.0);
     for (std::size_t i = 1; i < values.size(); ++i) {
+        // More than one turn is no meridian but a fault of the file.
         const double turns = std::round((values[i - 1] + step - values[i]) / 360.0);
         if (std::abs(turns) == 1.0)
             values[i] += turns * 360.0;

@@ -21,9 +21,9 @@ struct SpatialAxis {
     bool isTurned = false;
     /// Equally spaced within a thousandth of the spacing, and no rotated pole's.
     bool isRegular = false;
-    bool isGeographic = false;
-    double origin = 0.0;  ///< first value, where it is regular
-    double spacing = 1.0; ///< positive; 1 for an axis of one place
+    bool isGeographic = false; ///< degrees of longitude or latitude
+    double origin = 0.0;       ///< first value, where it is regular
+    double spacing = 1.0;      ///< positive; 1 for an axis of one place
 
     /// The place in the file of a place on the axis, and back.
     std::size_t InFile(int place) const {

@@ -295,6 +295,10 @@ TEST(GridRefusal, NamesTheItemStepOrPlaceThatTheFileDoesNotHave) {
     slice.SetItem(0);
     EXPECT_EQ(grid.engine.GetSlice(slice), kGridBadRequest);
     EXPECT_THAT(grid.engine.LastError().Text(), HasSubstr("no item 0 (1 to 1)"));
+    OpenGrid other(SampleGrid().Write("another"));
+    slice.Initilize(other.header, 0);
+    EXPECT_EQ(grid.engine.GetSlice(slice), kGridBadRequest);
+    EXPECT_THAT(grid.engine.LastError().Text(), HasSubstr("not made for this file"));
     slice.Initilize(grid.header, 1);
     EXPECT_EQ(grid.engine.GetSlice(slice), kGridBadRequest);
     slice.Initilize(grid.header, 0);
