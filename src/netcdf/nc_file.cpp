@@ -201,6 +201,18 @@ std::optional<double> NcFile::Number(int variable, const std::string& name) cons
     return values && values->size() == 1 ? std::optional(values->front()) : std::nullopt;
 }
 
+std::vector<std::size_t> NcFile::ChunkShape(const NcVariable& variable) const {
+    std::vector<std::size_t> lengths(variable.dimensions.size(), 0);
+    if (container != NcContainer::Hdf5 || lengths.empty())
+        return {};
+    const auto lock = LockNetcdf();
+    int storage = NC_CONTIGUOUS;
+    const int code = nc_inq_var_chunking(handle, variable.id, &storage, lengths.data());
+    const bool isChunked =
+        code == NC_NOERR && storage == NC_CHUNKED && !std::ranges::count(lengths, std::size_t{0});
+    return isChunked ? lengths : std::vector<std::size_t>();
+}
+
 Status NcFile::Read(const NcVariable& variable, std::span<const std::size_t> start,
                     std::span<const std::size_t> count, double* values) const {
     const auto lock = LockNetcdf();

@@ -60,6 +60,10 @@ class NcFile {
     /// Its only value.
     std::optional<double> Number(int variable, const std::string& name) const;
 
+    /// The lengths of a chunk of a netCDF-4 variable that is stored in chunks, one for each
+    /// dimension; empty for a variable that lies in the file as it is.
+    std::vector<std::size_t> ChunkShape(const NcVariable& variable) const;
+
     /// Reads a block of a numeric variable, one start and count for each dimension. The values are
     /// those of the file: neither scaled nor tested for being missing (NcValues does both).
     Status Read(const NcVariable& variable, std::span<const std::size_t> start,
