@@ -90,6 +90,27 @@ TEST(QuantileReport, TellsMethodProbabilitiesAndBounds) {
         EXPECT_THAT(report, HasSubstr(line));
 }
 
+TEST(QuantileReport, KeepsItsColumnsForPeriodsOfManyDigits) {
+    EngineCase thirds{"rain40", {"EXP1/MOM"}};
+    thirds.periods = {10.0 / 3, 1e7 / 3, 2.5};
+    const std::string report = EngineRunOf(thirds).File("Rynout2.txt");
+    const std::size_t head = report.find("              T              e");
+    ASSERT_NE(head, std::string::npos);
+    const std::size_t width = report.find('\n', head) - head;
+    for (const char* period :
+         {"\n        3.33333  ", "\n        3333333  ", "\n            2.5  "}) {
+        const std::size_t row = report.find(period, head);
+        ASSERT_NE(row, std::string::npos) << period;
+        EXPECT_EQ(report.find('\n', row + 1) - row - 1, width) << period;
+    }
+}
+
+TEST(EngineLog, GivesARateOfFewEventsItsDigits) {
+    const EngineRunOf run({"rain40", {"EXP1/MOM"}, 1, 4, {1e6}}, "AvgAnNum = 0.9",
+                          "AvgAnNum = 0.00002#");
+    EXPECT_THAT(run.Log(), HasSubstr(", 2.00000e-05 events a year\n"));
+}
+
 // Two signs are in use for one shape, and the bound of a negative alpha is easily overlooked.
 TEST(QuantileReport, TellsWhatEachShapeMeans) {
     const std::string maxima =
