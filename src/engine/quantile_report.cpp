@@ -52,14 +52,18 @@ void AppendQuantile(std::string& text, double period, double exceedance,
                      SixDigits(quantile.estimate + margin)});
 }
 
-// A heavy tail's resamples reach much further up than down, which no symmetric bounds show.
+// A heavy tail's resamples reach much further up than down, which no symmetric bounds show. How
+// many they are differs by period: where samples of few events drop out, the rest are the larger
+// ones.
 void AppendPercentiles(std::string& text, const std::vector<double>& periods,
                        const std::vector<stats::ResampledQuantile>& quantiles) {
-    text += "\nPercentile intervals: 95 % of the resampled quantiles lie between the bounds\n";
-    AppendRow(text, {"T", "lower", "estimate", "upper"});
+    text += "\nPercentile intervals: 95 % of the resampled quantiles lie between the bounds;\n"
+            "resamples are those that have the event\n";
+    AppendRow(text, {"T", "lower", "estimate", "upper", "resamples"});
     for (std::size_t i = 0; i < periods.size(); ++i)
         AppendRow(text, {PeriodCell(periods[i]), SixDigits(quantiles[i].lower),
-                         SixDigits(quantiles[i].estimate), SixDigits(quantiles[i].upper)});
+                         SixDigits(quantiles[i].estimate), SixDigits(quantiles[i].upper),
+                         std::to_string(quantiles[i].used)});
 }
 
 // Many failures make the deviation that of the milder samples.

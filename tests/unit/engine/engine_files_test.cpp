@@ -127,11 +127,31 @@ TEST(QuantileReport, TellsWhatEachShapeMeans) {
 }
 
 TEST(QuantileReport, HasPercentileIntervalsOfMonteCarloAlone) {
-    const std::string table = "           T          lower       estimate          upper\n";
+    const std::string table =
+        "           T          lower       estimate          upper      resamples\n";
     const std::string drawn = EngineRunOf({"rain40", {"GP2/LMOM"}}).File("Rynout2.txt");
     EXPECT_THAT(drawn, HasSubstr(table));
     EXPECT_THAT(EngineRunOf({"rain40", {"GP2/LMOM"}, 1}).File("Rynout2.txt"),
                 Not(HasSubstr(table)));
+}
+
+// With 0.92 events a year a period of 1.2 years is that of nearly every event: samples of few
+// events have none so frequent.
+TEST(QuantileReport, CountsTheResamplesBehindEachPeriod) {
+    EngineCase shortPeriod{"rain40", {"EXP1/MOM"}};
+    shortPeriod.periods = {1.2, 100};
+    const std::string report = EngineRunOf(shortPeriod).File("Rynout2.txt");
+    const std::size_t table = report.find("resamples\n            1.2 ");
+    ASSERT_NE(table, std::string::npos) << report;
+    const auto countAtEnd = [&report](std::size_t line) {
+        const std::size_t end = report.find('\n', line);
+        return std::stoi(report.substr(report.rfind(' ', end), end));
+    };
+    const std::size_t first = report.find('\n', table) + 1;
+    EXPECT_GT(countAtEnd(first), 600);
+    EXPECT_LT(countAtEnd(first), 950);
+    EXPECT_EQ(countAtEnd(report.find('\n', first) + 1), 1000);
+    EXPECT_THAT(report, HasSubstr("could not be fitted: 0 of 1000\n"));
 }
 
 TEST(EngineFiles, HoldNothingThatWasNotAskedFor) {
