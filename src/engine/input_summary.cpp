@@ -5,6 +5,7 @@
 
 #include "base/number_text.h"
 #include "engine/plain_text.h"
+#include "engine/report_text.h"
 #include "stats/monte_carlo.h"
 
 namespace ryn {
@@ -23,11 +24,16 @@ std::string SeriesLine(const EngineInput& input) {
 }
 
 // A rate comes from a count over a record length and has more digits than meaning.
+std::string RateText(double rate) {
+    constexpr double kFewest = 0.01; // with fewer, four decimals leave no digits
+    return rate < kFewest ? SixDigits(rate) : FixedText(rate, 4);
+}
+
 std::string KindLine(const EngineInput& input) {
     if (input.frame.kind == SeriesKind::AnnualMaximum)
         return "Kind: annual maxima";
     return "Kind: partial durations, threshold " + ShortestText(input.threshold) +
-           UnitSuffix(input) + ", " + FixedText(input.averageNumber, 4) + " events a year";
+           UnitSuffix(input) + ", " + RateText(input.averageNumber) + " events a year";
 }
 
 // Whether T counts events or annual maxima moves a quantile by much at short periods.

@@ -1,5 +1,7 @@
 #include "engine/quantile_report.h"
 
+#include <cstddef>
+
 #include "base/number_text.h"
 #include "engine/plain_text.h"
 #include "engine/report_parts.h"
@@ -30,26 +32,38 @@ std::string_view MethodNotes(UncertaintyMethod method) {
     return "No averages and deviations were asked for.\n";
 }
 
+// As it was given, but for one with so many digits (a third of a year) that it would push the rest
+// of its row out of the columns.
+std::string PeriodCell(double years) {
+    constexpr std::size_t kLongest = 13;
+    const std::string text = PeriodText(years);
+    return text.size() <= kLongest ? text : SixDigits(years);
+}
+
 // The bounds are symmetric and thus too narrow above for a heavy tail, which the head says; the
 // deviation is what the pages show.
 void AppendQuantile(std::string& text, double period, double exceedance,
                     const stats::ResampledQuantile& quantile) {
     constexpr double kNormal95 = 1.96; // half width of the central 95 % in standard deviations
     const double margin = kNormal95 * quantile.standardDeviation;
-    AppendRow(text, {PeriodText(period), SixDigits(exceedance), SixDigits(quantile.estimate),
+    AppendRow(text, {PeriodCell(period), SixDigits(exceedance), SixDigits(quantile.estimate),
                      SixDigits(quantile.average), SixDigits(quantile.bias),
                      SixDigits(quantile.standardDeviation), SixDigits(quantile.estimate - margin),
                      SixDigits(quantile.estimate + margin)});
 }
 
-// A heavy tail's resamples reach much further up than down, which no symmetric bounds show.
+// A heavy tail's resamples reach much further up than down, which no symmetric bounds show. How
+// many they are differs by period: where samples of few events drop out, the rest are the larger
+// ones.
 void AppendPercentiles(std::string& text, const std::vector<double>& periods,
                        const std::vector<stats::ResampledQuantile>& quantiles) {
-    text += "\nPercentile intervals: 95 % of the resampled quantiles lie between the bounds\n";
-    AppendRow(text, {"T", "lower", "estimate", "upper"});
+    text += "\nPercentile intervals: 95 % of the resampled quantiles lie between the bounds;\n"
+            "resamples are those that have the event\n";
+    AppendRow(text, {"T", "lower", "estimate", "upper", "resamples"});
     for (std::size_t i = 0; i < periods.size(); ++i)
-        AppendRow(text, {PeriodText(periods[i]), SixDigits(quantiles[i].lower),
-                         SixDigits(quantiles[i].estimate), SixDigits(quantiles[i].upper)});
+        AppendRow(text, {PeriodCell(periods[i]), SixDigits(quantiles[i].lower),
+                         SixDigits(quantiles[i].estimate), SixDigits(quantiles[i].upper),
+                         std::to_string(quantiles[i].used)});
 }
 
 // Many failures make the deviation that of the milder samples.

@@ -79,6 +79,7 @@ std::vector<ResampledQuantile> QuantileTally::Summarised(std::vector<Entry>& ent
     for (Entry& entry : entries) {
         ResampledQuantile& result =
             results.emplace_back(ResampledQuantile{entry.estimate, kNaN, kNaN, kNaN});
+        result.used = static_cast<std::size_t>(entry.differences.count);
         if (entry.differences.count >= static_cast<double>(needed)) {
             summary(result, entry.differences);
             SetPercentileInterval(entry.replicates, result);

@@ -27,6 +27,9 @@ struct ResampledQuantile {
     /// that estimate and deviation cannot show. Only of Monte Carlo and only at return periods.
     double lower = std::numeric_limits<double>::quiet_NaN();
     double upper = std::numeric_limits<double>::quiet_NaN();
+    /// Resamples that have this quantile. Monte Carlo samples of few events a year have none at a
+    /// short return period.
+    std::size_t used = 0;
 };
 
 /// The outcome of a Monte Carlo or jackknife pass.

@@ -72,10 +72,8 @@ TEST(GoodnessReport, ShowsWhatEachMeasureIsMadeOf) {
           "  SLSC                            0.0156744\n",
           "  Log-likelihood                    4.29495\n",
           "  Akaike's criterion               -2.58991\n",
-          "           rank          place              x              p           F(x)  quantile "
-          "of p",
-          "              1             19        3.57000     0.00920245      0.0148458        "
-          "3.54640 "})
+          "           rank          place              x              p           F(x)  quant",
+          "             19        3.57000     0.00920245      0.0148458        3.54640 "})
         EXPECT_THAT(report, HasSubstr(line));
 }
 
@@ -88,6 +86,27 @@ TEST(QuantileReport, TellsMethodProbabilitiesAndBounds) {
           "             10       0.109091        66.4610        66.4610",
           "\nResamples that could not be fitted: 0 of 44\n"})
         EXPECT_THAT(report, HasSubstr(line));
+}
+
+TEST(QuantileReport, KeepsItsColumnsForPeriodsOfManyDigits) {
+    EngineCase thirds{"rain40", {"EXP1/MOM"}};
+    thirds.periods = {10.0 / 3, 1e7 / 3, 2.5};
+    const std::string report = EngineRunOf(thirds).File("Rynout2.txt");
+    const std::size_t head = report.find("              T              e");
+    ASSERT_NE(head, std::string::npos);
+    const std::size_t width = report.find('\n', head) - head;
+    for (const char* period :
+         {"\n        3.33333  ", "\n        3333333  ", "\n            2.5  "}) {
+        const std::size_t row = report.find(period, head);
+        ASSERT_NE(row, std::string::npos) << period;
+        EXPECT_EQ(report.find('\n', row + 1) - row - 1, width) << period;
+    }
+}
+
+TEST(EngineLog, GivesARateOfFewEventsItsDigits) {
+    const EngineRunOf run({"rain40", {"EXP1/MOM"}, 1, 4, {1e6}}, "AvgAnNum = 0.9",
+                          "AvgAnNum = 0.00002#");
+    EXPECT_THAT(run.Log(), HasSubstr(", 2.00000e-05 events a year\n"));
 }
 
 // Two signs are in use for one shape, and the bound of a negative alpha is easily overlooked.
@@ -106,11 +125,31 @@ TEST(QuantileReport, TellsWhatEachShapeMeans) {
 }
 
 TEST(QuantileReport, HasPercentileIntervalsOfMonteCarloAlone) {
-    const std::string table = "           T          lower       estimate          upper\n";
+    const std::string table =
+        "           T          lower       estimate          upper      resamples\n";
     const std::string drawn = EngineRunOf({"rain40", {"GP2/LMOM"}}).File("Rynout2.txt");
     EXPECT_THAT(drawn, HasSubstr(table));
     EXPECT_THAT(EngineRunOf({"rain40", {"GP2/LMOM"}, 1}).File("Rynout2.txt"),
                 Not(HasSubstr(table)));
+}
+
+// With 0.92 events a year a period of 1.2 years is that of nearly every event: samples of few
+// events have none so frequent.
+TEST(QuantileReport, CountsTheResamplesBehindEachPeriod) {
+    EngineCase shortPeriod{"rain40", {"EXP1/MOM"}};
+    shortPeriod.periods = {1.2, 100};
+    const std::string report = EngineRunOf(shortPeriod).File("Rynout2.txt");
+    const std::size_t table = report.find("resamples\n            1.2 ");
+    ASSERT_NE(table, std::string::npos) << report;
+    const auto countAtEnd = [&report](std::size_t line) {
+        const std::size_t end = report.find('\n', line);
+        return std::stoi(report.substr(report.rfind(' ', end), end));
+    };
+    const std::size_t first = report.find('\n', table) + 1;
+    EXPECT_GT(countAtEnd(first), 600);
+    EXPECT_LT(countAtEnd(first), 950);
+    EXPECT_EQ(countAtEnd(report.find('\n', first) + 1), 1000);
+    EXPECT_THAT(report, HasSubstr("could not be fitted: 0 of 1000\n"));
 }
 
 TEST(EngineFiles, HoldNothingThatWasNotAskedFor) {
