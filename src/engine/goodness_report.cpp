@@ -1,5 +1,8 @@
 #include "engine/goodness_report.h"
 
+#include <algorithm>
+#include <cmath>
+
 #include "engine/input_summary.h"
 #include "engine/plain_text.h"
 #include "engine/report_parts.h"
@@ -127,9 +130,22 @@ void AppendPlotMeasures(std::string& text, const FitMeasureRequests& asked,
         AppendValue(text, "II (reduced variates)", SixDigits(found.reducedCorrelation));
 }
 
+// A peak at the threshold, which every series selected by number has, has density 0 or infinity in
+// some families: without a word the missing likelihood would look like a fault of the fit.
+void AppendReason(std::string& text, const stats::Distribution& fitted,
+                  const stats::ProbabilityPlot& plot) {
+    const auto count =
+        std::count_if(plot.observed.begin(), plot.observed.end(),
+                      [&fitted](double x) { return !std::isfinite(stats::LogDensity(fitted, x)); });
+    if (count > 0)
+        text += "  It does not exist: the density is 0 or infinite at " + std::to_string(count) +
+                " value(s), such as peaks at the threshold.\n";
+}
+
 // What was not asked for was not computed: it is left out rather than shown as 0.
 void AppendMeasures(std::string& text, const FitMeasureRequests& asked,
-                    const CombinationResults& results) {
+                    const CombinationAnalysis& analysis) {
+    const CombinationResults& results = analysis.results;
     const FitMeasures& found = results.measures;
     if (asked.chiSquared)
         AppendChiSquared(text, found.chiSquared);
@@ -142,6 +158,8 @@ void AppendMeasures(std::string& text, const FitMeasureRequests& asked,
     text += "\nLikelihood\n";
     AppendValue(text, "Log-likelihood", SixDigits(found.logLikelihood));
     AppendValue(text, "Akaike's criterion", SixDigits(stats::AkaikeCriterion(*results.fit)));
+    if (std::isnan(found.logLikelihood))
+        AppendReason(text, results.fit->distribution, analysis.plot);
 }
 
 // The numbers behind the probability plot, for users who draw their own.
@@ -180,7 +198,7 @@ std::string GoodnessReportOf(const EngineInput& input, std::size_t index,
     std::string text = CombinationHead(input, index, results);
     if (!results.fit)
         return text;
-    AppendMeasures(text, input.measures, results);
+    AppendMeasures(text, input.measures, analysis);
     AppendPlot(text, results.fit->distribution, analysis.plot, series.places);
     return text;
 }

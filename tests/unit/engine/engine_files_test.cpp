@@ -109,6 +109,14 @@ TEST(EngineLog, GivesARateOfFewEventsItsDigits) {
     EXPECT_THAT(run.Log(), HasSubstr(", 2.00000e-05 events a year\n"));
 }
 
+TEST(GoodnessReport, SaysWhyALikelihoodDoesNotExist) {
+    const EngineRunOf run({"rain40", {"WEI2/LMOM"}}, "ExtremeValues = 44.5", "ExtremeValues = 40");
+    EXPECT_THAT(run.File("Rynout1.txt"),
+                HasSubstr("the density is 0 or infinite at 1 value(s), such as peaks at"));
+    EXPECT_THAT(EngineRunOf({"rain40", {"WEI2/LMOM"}}).File("Rynout1.txt"),
+                Not(HasSubstr("does not exist:")));
+}
+
 // Two signs are in use for one shape, and the bound of a negative alpha is easily overlooked.
 TEST(QuantileReport, TellsWhatEachShapeMeans) {
     const std::string maxima =
