@@ -96,16 +96,20 @@ EngineStatus EngineRun::Fail(EngineStatus status, const EngineInput& input,
 
 std::vector<CombinationResults> EngineRun::AnalyseAll(const EngineInput& input,
                                                       const SeriesResults& series) {
-    goodness.Write(GoodnessReportHead(input, series));
-    quantiles.Write(QuantileReportHead(input));
+    if (goodness.IsWanted())
+        goodness.Write(GoodnessReportHead(input, series));
+    if (quantiles.IsWanted())
+        quantiles.Write(QuantileReportHead(input));
     std::vector<CombinationResults> combinations;
     for (std::size_t i = 0; i < input.combinations.size(); ++i) {
         CombinationAnalysis analysis = AnalyseCombination(input, series, input.combinations[i]);
         Tell(LabelOf(input.combinations[i], i), series, analysis.results);
         // Written one by one, and the plot with its n ranks dropped then: a report of thirty
         // combinations is larger than all else in memory.
-        goodness.Write(GoodnessReportOf(input, i, series, analysis));
-        quantiles.Write(QuantileReportOf(input, i, series, analysis.results));
+        if (goodness.IsWanted())
+            goodness.Write(GoodnessReportOf(input, i, series, analysis));
+        if (quantiles.IsWanted())
+            quantiles.Write(QuantileReportOf(input, i, series, analysis.results));
         combinations.push_back(std::move(analysis.results));
     }
     FinishReport(goodness, kGoodnessReportName);

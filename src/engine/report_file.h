@@ -14,6 +14,8 @@ class ReportFile {
     /// In a directory with its trailing separator; an empty one means no file.
     ReportFile(const std::string& directory, const std::string& name);
 
+    /// Whether there is a file to write; a long text need not be made otherwise.
+    bool IsWanted() const { return wanted; }
     void Write(std::string_view text);
     /// The reason why there is no new file; Ok also where none was wanted.
     Status Finish();

@@ -42,10 +42,9 @@ void RemoveReports(const std::string& directory) {
     }
 }
 
-// The last line stands in the log whatever happened in between.
-EngineStatus RunLogged(const KvfTree* tree, KvfHandle* output) {
-    // First of all, so that whatever is wrong with the rest of the tree can be told.
-    const std::string directory = EngineDirectory(tree);
+// Without a directory nothing is written. The last line stands in the log whatever happened in
+// between.
+EngineStatus RunLogged(const KvfTree* tree, KvfHandle* output, const std::string& directory) {
     RunLog log(directory);
     RemoveReports(directory);
     log.Line(ProgramText());
@@ -55,18 +54,33 @@ EngineStatus RunLogged(const KvfTree* tree, KvfHandle* output) {
     return status;
 }
 
-} // namespace
+enum class EngineFiles { Written, Omitted };
 
-void RYNENGINE(const KvfHandle* input, KvfHandle* output, std::int32_t* status) noexcept {
-    // Callers cannot catch: the module and its host meet in plain functions.
+// Callers cannot catch: the module and its host meet in plain functions.
+void Run(const KvfHandle* input, KvfHandle* output, std::int32_t* status,
+         EngineFiles files) noexcept {
     auto reached = EngineStatus::SetUpFailed;
     try {
-        reached = RunLogged(input == nullptr ? nullptr : input->get(), output);
+        const KvfTree* const tree = input == nullptr ? nullptr : input->get();
+        // First of all, so that whatever is wrong with the rest of the tree can be told.
+        reached = RunLogged(tree, output,
+                            files == EngineFiles::Written ? EngineDirectory(tree) : std::string());
     } catch (...) { // not even the log could be written
         reached = EngineStatus::SetUpFailed;
     }
     if (status != nullptr)
         *status = static_cast<std::int32_t>(reached);
+}
+
+} // namespace
+
+void RYNENGINE(const KvfHandle* input, KvfHandle* output, std::int32_t* status) noexcept {
+    Run(input, output, status, EngineFiles::Written);
+}
+
+void RynEngineWithoutFiles(const KvfHandle* input, KvfHandle* output,
+                           std::int32_t* status) noexcept {
+    Run(input, output, status, EngineFiles::Omitted);
 }
 
 } // namespace ryn

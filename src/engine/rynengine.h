@@ -30,4 +30,9 @@ enum class EngineStatus : std::int32_t {
 /// grows with the square of the number of values.
 void RYNENGINE(const KvfHandle* input, KvfHandle* output, std::int32_t* status) noexcept;
 
+/// The same, to the last digit, without log and reports: for one of many series, whose files the
+/// next one's would replace.
+void RynEngineWithoutFiles(const KvfHandle* input, KvfHandle* output,
+                           std::int32_t* status) noexcept;
+
 } // namespace ryn

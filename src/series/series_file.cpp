@@ -74,6 +74,7 @@ Status WriteSeriesFile(const std::string& path, const SeriesFileContent& content
     tsqSetAppTitle(header.get(), ports.application->ApplicationName());
     tsqSetDeleteValFloat(header.get(), 0.0F);
     tsqSetDeleteValDouble(header.get(), 0.0);
+    tsqSetDurability(header.get(), content.durability);
     SetAxis(header.get(), content, selection);
     DescribeItem(header.get(), content);
     TsqFileHandle file;

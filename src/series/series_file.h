@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "base/atomic_file.h"
 #include "base/status.h"
 #include "ports/ports.h"
 #include "series/sts_item.h"
@@ -16,6 +17,7 @@ struct SeriesFileContent {
     int itemType = 0;
     int itemUnit = 0;
     bool hasCalendarAxis = false; ///< else a relative one
+    Durability durability = Durability::Flushed;
 };
 
 /// Writes an extreme value series: one item on a non-equidistant axis in seconds from its first

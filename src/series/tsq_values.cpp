@@ -321,7 +321,8 @@ ExtractionReport CTsqValues::ExtractSeries(const std::string& outputPath, Select
         const bool hasCalendarAxis = axisKind == AxisKind::EquidistantCalendar ||
                                      axisKind == AxisKind::NonEquidistantCalendar;
         report.written = WriteSeriesFile(
-            outputPath, {title, itemName, itemType, itemUnit, hasCalendarAxis}, selection, *ports);
+            outputPath, {title, itemName, itemType, itemUnit, hasCalendarAxis, durability},
+            selection, *ports);
     } catch (const std::bad_alloc&) {
         report.written = OutOfMemory(outputPath);
     }

@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "base/atomic_file.h"
 #include "base/status.h"
 #include "kvf/kvf.h"
 #include "ports/ports.h"
@@ -59,6 +60,8 @@ class CTsqValues {
     bool ReadSeries(const std::string& path, int itemIndex);
     /// Frees the samples.
     void ClearSeries();
+    /// How ExtractSeries writes its file; flushed unless told otherwise.
+    void SetDurability(Durability wanted) { durability = wanted; }
     /// Why the last read gave false.
     const Status& ReadError() const { return readError; }
 
@@ -101,6 +104,7 @@ class CTsqValues {
                                        ExtractionReport* report);
 
     const Ports* ports = &SilentPorts();
+    Durability durability = Durability::Flushed;
     Status readError;
 };
 

@@ -179,6 +179,16 @@ int tsqWriteItemTimeStep(TsqHeader* header, TsqFile* file, double time, const fl
     return file->writer->Append(time, values) ? 0 : FailWriting(file->writer->Failure());
 }
 
+int tsqWriteItemBlock(TsqHeader* header, TsqFile* file, const double* times, const float* values,
+                      std::size_t count) {
+    if (header == nullptr || file == nullptr || !file->writer || (values == nullptr && count != 0))
+        return FailWriting(Status::InputFault("no file is open for writing"));
+    if (times == nullptr && !tsqGetTimeAxis(header).IsEquidistant())
+        return FailWriting(Status::InputFault("the time steps have no times"));
+    return file->writer->AppendSteps(times, values, count) ? 0
+                                                           : FailWriting(file->writer->Failure());
+}
+
 int tsqFileClose(TsqHeader* /*header*/, TsqFileHandle* file) {
     if (file == nullptr || *file == nullptr)
         return 0;

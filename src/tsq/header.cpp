@@ -49,6 +49,13 @@ int tsqSetAppTitle(TsqHeader* header, const std::string& text) {
     return 0;
 }
 
+int tsqSetDurability(TsqHeader* header, Durability durability) {
+    if (header == nullptr)
+        return NoHeader();
+    header->durability = durability;
+    return 0;
+}
+
 int tsqSetDeleteValFloat(TsqHeader* header, float value) {
     if (header == nullptr)
         return NoHeader();

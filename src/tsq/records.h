@@ -56,6 +56,7 @@ struct TsqHeader {
     TsqProjection projection;
     TsqAxis axis;
     TsqGridCoordinates coordinates;
+    Durability durability = Durability::Flushed;
     std::vector<TsqItem> items; ///< keeps its size, so that item handles stay
 };
 

@@ -61,6 +61,35 @@ void StepWriter::AppendPlane(const TsqItem& of, const float* values) {
         content.header.deleteFloat);
 }
 
+bool StepWriter::AppendTimes(const double* times, std::size_t size) {
+    if (size > static_cast<std::size_t>(INT_MAX) - count)
+        return Fail("a data file has at most 2147483647 time steps");
+    if (content.header.axis.IsEquidistant())
+        return true;
+    if (!std::all_of(times, times + size, [](double time) { return std::isfinite(time); }))
+        return Fail("the time of a step is not finite");
+    const std::size_t first = content.times.size();
+    content.times.resize(first + size);
+    std::transform(times, times + size, content.times.begin() + static_cast<std::ptrdiff_t>(first),
+                   [this](double time) { return RoundedToMillisecond(time, millisecondsInUnit); });
+    return true;
+}
+
+bool StepWriter::AppendSteps(const double* times, const float* values, std::size_t size) try {
+    const bool isPlain =
+        content.header.items.size() == 1 && content.header.items[0].dimensions == 0;
+    if (failure && !isPlain)
+        return Fail("whole steps are appended to a plain series of one item only");
+    if (!failure || !AppendTimes(times, size))
+        return false;
+    content.values[0].insert(content.values[0].end(), values, values + size);
+    count += size;
+    return true;
+} catch (const std::bad_alloc&) {
+    failure = Status::SystemFault(path + ": not enough memory for the time steps");
+    return false;
+}
+
 bool StepWriter::Append(double time, const float* values) try {
     if (!failure || (item == 0 && !AppendTime(time)))
         return false;
@@ -99,7 +128,7 @@ Status StepWriter::Finish() {
         return MemoryStore::Instance().Put(path, std::move(content));
     if (Status status = EncodeNetcdf(content, target.TemporaryName(), path); !status)
         return status;
-    return target.Commit(Durability::Flushed);
+    return target.Commit(content.header.durability);
 }
 
 } // namespace ryn

@@ -19,11 +19,15 @@ class StepWriter {
     /// Appends the next item of the current step. A failure stays, since a file that lacks a step
     /// must not take its name.
     bool Append(double time, const float* values);
+    /// The same for `size` whole steps of a file with one item without spatial dimensions; `times`
+    /// is not looked at on an equidistant axis.
+    bool AppendSteps(const double* times, const float* values, std::size_t size);
     const Status& Failure() const { return failure; }
     Status Finish();
 
   private:
     bool AppendTime(double time);
+    bool AppendTimes(const double* times, std::size_t size);
     void AppendPlane(const TsqItem& item, const float* values);
     bool Fail(const std::string& reason);
     void CompleteAxis();

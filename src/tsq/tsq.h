@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "base/atomic_file.h"
 #include "base/status.h"
 #include "units/units.h"
 
@@ -177,6 +178,8 @@ struct TsqGridCoordinates {
 /// Coordinates of every item with two spatial axes, whose sizes they must have (tsqFileCreate
 /// fails otherwise). Without this call they follow from origin and step.
 int tsqSetGridCoordinates(TsqHeader* header, const TsqGridCoordinates& coordinates);
+/// Whether the file is flushed to the disk when it is closed; it is without this call.
+int tsqSetDurability(TsqHeader* header, Durability durability);
 /// Makes the file: it takes its name when it is closed, so that an old file stands until then.
 int tsqFileCreate(const std::string& path, TsqHeader* header, TsqFileHandle* file);
 /// Appends the next item of the current time step. The time counts with the first item of a step
@@ -185,8 +188,14 @@ int tsqFileCreate(const std::string& path, TsqHeader* header, TsqFileHandle* fil
 /// NaN in it becomes the delete value. After a failure the file cannot be completed any more.
 int tsqWriteItemTimeStep(TsqHeader* header, TsqFile* file, double time, const float* values);
 
-/// Closes; a file being written is completed, flushed to the disk, and takes its name here. On
-/// failure an old file of that name stays as it was. A null file is no error.
+/// Appends whole steps of a file with one item without spatial dimensions. `times` has `count`
+/// numbers, as tsqWriteItemTimeStep takes them; null on an equidistant axis.
+int tsqWriteItemBlock(TsqHeader* header, TsqFile* file, const double* times, const float* values,
+                      std::size_t count);
+
+/// Closes; a file being written is completed, flushed to the disk unless its header says otherwise,
+/// and takes its name here. On failure an old file of that name stays as it was. A null file is no
+/// error.
 int tsqFileClose(TsqHeader* header, TsqFileHandle* file);
 void tsqHeaderDestroy(TsqHeaderHandle* header);
 

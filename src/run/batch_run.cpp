@@ -1,0 +1,260 @@
+#include "run/batch_run.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "base/atomic_file.h"
+#include "base/path_parts.h"
+#include "base/process_limits.h"
+#include "strings/catalogue.h"
+
+namespace ryn {
+
+namespace {
+
+constexpr double kMebibyte = 1024.0 * 1024.0;
+
+/// What the engine, the stores and the netCDF library take, whatever the grid.
+constexpr double kFixedBytes = 24 * kMebibyte;
+
+} // namespace
+
+BatchRun::BatchRun(CRynEditDoc& analysed, const GridBatchOptions& wanted)
+    : document(analysed),
+      root(analysed.GetGlobalKvf()),
+      options(wanted),
+      directory(SplitPath(analysed.GetPathName()).directory),
+      ports(analysed),
+      analysis(analysed, wanted.engines),
+      layout(ResultLayout::Of(root)) {
+    outcome.logFile = LogFileOf(root.DefineEVS().OutputFileName);
+    // The next point overwrites its files.
+    document.SetDurability(Durability::Unflushed);
+    root.Values().SetDurability(Durability::Unflushed);
+}
+
+BatchRun::~BatchRun() {
+    document.SetDurability(Durability::Flushed);
+    root.Values().SetDurability(Durability::Flushed);
+}
+
+bool BatchRun::End(BatchEnd how, Status reason) {
+    outcome.end = how;
+    outcome.reason = std::move(reason);
+    return false;
+}
+
+bool BatchRun::Fail(Status reason) {
+    return End(BatchEnd::Failed, std::move(reason));
+}
+
+bool BatchRun::IsStopped() {
+    if (!options.isStopped || !options.isStopped())
+        return false;
+    outcome.end = BatchEnd::Stopped;
+    return true;
+}
+
+// The grid is the user's data, and the files of the analysis are written while the batch runs.
+Status BatchRun::TestFiles(const GridPlan& plan) {
+    const std::string& results = root.DefineEVS().OutputFileName;
+    for (const std::string& other :
+         {plan.gridFile, document.GetPathName(), analysis.ParameterFile(), results})
+        if (plan.outputFile == other || IsSameFile(plan.outputFile, other))
+            return Status::InputFault(FormatText(kTextGridOutputTaken, plan.outputFile));
+    if (Status free = document.TestResultFileName(); !free)
+        return free;
+    for (const std::string& written : {plan.outputFile, analysis.ParameterFile(), results})
+        if (Status writable = TestAtomicWrite(written); !written.empty() && !writable)
+            return writable;
+    return Status::Ok();
+}
+
+bool BatchRun::Prepare() {
+    const CTsq2InputKvf& input = root.GridInput();
+    if (!input.UseTsq2Input)
+        return false;
+    GridPlan plan;
+    if (Status fault = MakeGridPlan(input, SplitPath(document.GetPathName()).directory, &plan);
+        !fault)
+        return End(BatchEnd::Refused,
+                   Status::InputFault(document.GetPathName() + ": " + fault.Text()));
+    outcome.outputFile = plan.outputFile;
+    outcome.counts.points = plan.Points();
+    Status fault = series.Open(plan);
+    if (fault)
+        fault = TestFiles(plan);
+    return fault ? true : End(BatchEnd::Refused, std::move(fault));
+}
+
+std::optional<std::size_t> BatchRun::MemoryForTile() {
+    const double wanted =
+        static_cast<double>(options.memory != 0 ? options.memory : UsableMemory() / 4);
+    const double slice = static_cast<double>(Plan().Whole().Points()) * sizeof(float);
+    const double beside = ResultGrids::BytesFor(layout, Plan()) + 2.0 * slice +
+                          2.0 * Plan().Points() + static_cast<double>(series.BytesOfPoint()) +
+                          kFixedBytes;
+    const double tile = std::max(slice, 8.0 * Plan().Steps());
+    if (beside + tile <= wanted)
+        return static_cast<std::size_t>(wanted - beside);
+    End(BatchEnd::Refused,
+        Status::SystemFault(
+            FormatText(kTextGridMemoryTooSmall, (beside + tile) / kMebibyte, wanted / kMebibyte)));
+    return std::nullopt;
+}
+
+bool BatchRun::ReadActivity() {
+    const std::optional<std::size_t> memory = MemoryForTile();
+    if (!memory)
+        return false;
+    std::vector<bool> found;
+    if (Status read = series.ReadActivity(*memory, &found); !read)
+        return Fail(std::move(read));
+    SetActivity(found);
+    return true;
+}
+
+void BatchRun::SetActivity(const std::vector<bool>& found) {
+    active = found;
+    states.assign(active.size(), PointState::Inactive);
+    for (std::size_t p = 0; p < active.size(); ++p)
+        if (active[p])
+            states[p] = PointState::Waiting;
+    outcome.counts.active = static_cast<int>(std::count(active.begin(), active.end(), true));
+    lines.emplace(active, options.print);
+}
+
+GridPoint BatchRun::OffsetsOf(int point) const {
+    const GridPoint place = Plan().PointAt(point);
+    return {place.x - Plan().x.first, place.y - Plan().y.first};
+}
+
+std::string BatchRun::KeptNameOf(int point) const {
+    if (!root.GridInput().SaveEVS)
+        return {};
+    const PathParts parts = SplitPath(Plan().outputFile);
+    const GridPoint offsets = OffsetsOf(point);
+    return parts.directory + "ExtremeValueSeries/" + parts.name + "_" + std::to_string(offsets.x) +
+           "_" + std::to_string(offsets.y) + ".tsq0";
+}
+
+ScratchFiles BatchRun::MakeScratch() const {
+    const std::string other = SplitPath(document.GetPathName()).directory;
+    return options.scratch == Scratch::Disk ? ScratchFiles::OnDisk(other)
+                                            : ScratchFiles::InMemory(other);
+}
+
+void BatchRun::NotePoint(int point, PointState state) {
+    states[static_cast<std::size_t>(point)] = state;
+    ++outcome.counts.computed;
+    outcome.counts.failed += state == PointState::Failed ? 1 : 0;
+    lines->Computed(point, state == PointState::Good);
+    if (options.progress != nullptr)
+        options.progress->ShowProgress(++done, outcome.counts.active);
+}
+
+/// Notes how a point ended.
+bool BatchRun::Take(int point, const PointOutcome& ended) {
+    if (ended.end == PointEnd::Broken)
+        return Fail(Status::SystemFault(ended.reason.Text()));
+    outcome.counts.withFewerPeaks += ended.hasFewerPeaks ? 1 : 0;
+    if (ended.end != PointEnd::SetUpFailed) {
+        NotePoint(point, ended.end == PointEnd::Good ? PointState::Good : PointState::Failed);
+        return true;
+    }
+    ++outcome.counts.computed;
+    if (options.scratch == Scratch::Memory && !LeaveFilesOf(point))
+        return false;
+    outcome.end = BatchEnd::SetUpFailed;
+    document.GetPorts().textViewer->ViewTextFile(outcome.logFile);
+    return false;
+}
+
+bool BatchRun::RunPoint(int point, CTsq0FileInfo& files, const TakeResults& take) {
+    if (IsStopped())
+        return false;
+    const int before = ports.ExtractionsWithMissingYears();
+    const PointOutcome ended =
+        analysis.Run({files.Path(), files.NameSeries(), KeptNameOf(point)},
+                     options.scratch == Scratch::Disk ? PointTrace::Files : PointTrace::None);
+    outcome.counts.withMissingYears += ports.ExtractionsWithMissingYears() - before;
+    if (ended.end == PointEnd::Good)
+        take(point, PointResults(document.Results(), layout, series.Header().DeleteValue()));
+    return Take(point, ended);
+}
+
+bool BatchRun::RunPart(const GridTile& part, const TakeResults& take) {
+    const std::optional<std::size_t> memory = MemoryForTile();
+    if (!memory)
+        return false;
+    ScratchFiles scratch = MakeScratch();
+    bool goesOn = true;
+    Status read =
+        series.ForEachPoint(part, *memory, active, scratch, [&](int point, CTsq0FileInfo& files) {
+            goesOn = RunPoint(point, files, take);
+            return goesOn ? Next::GoOn : Next::Stop;
+        });
+    outcome.counts.withMissing = series.SeriesWithMissing();
+    return read ? goesOn : Fail(std::move(read));
+}
+
+/// Reads one point's series and runs it, without noting anything.
+bool BatchRun::RunAgain(int point, PointTrace trace, PointOutcome* ended) {
+    const std::optional<std::size_t> memory = MemoryForTile();
+    if (!memory)
+        return false;
+    const GridPoint place = Plan().PointAt(point);
+    GridTile tile = Plan().Whole();
+    tile.firstX = place.x;
+    tile.firstY = place.y;
+    tile.countX = tile.countY = 1;
+    ScratchFiles scratch = MakeScratch();
+    Status read = series.ForEachPoint(
+        tile, *memory, active, scratch, [&](int /*point*/, CTsq0FileInfo& files) {
+            *ended = analysis.Run({files.Path(), files.NameSeries(), ""}, trace);
+            return Next::GoOn;
+        });
+    if (!read)
+        return Fail(std::move(read));
+    return ended->end == PointEnd::Broken ? Fail(Status::SystemFault(ended->reason.Text())) : true;
+}
+
+bool BatchRun::LeaveFilesOf(int point) {
+    PointOutcome ended;
+    for (int p = point - 1; p >= 0; --p)
+        if (states[static_cast<std::size_t>(p)] == PointState::Good) {
+            if (!RunAgain(p, PointTrace::None, &ended))
+                return false;
+            break;
+        }
+    return RunAgain(point, PointTrace::Files, &ended);
+}
+
+bool BatchRun::LeaveLastFiles() {
+    for (int p = Plan().Points() - 1; p >= 0; --p)
+        if (active[static_cast<std::size_t>(p)])
+            return LeaveFilesOf(p);
+    return true;
+}
+
+bool BatchRun::WriteOutput(ResultGrids& grids) {
+    const bool hasGood = std::count(states.begin(), states.end(), PointState::Good) != 0;
+    if (!hasGood || !HasLayout(document.Results(), layout)) {
+        outcome.end = BatchEnd::NothingGood;
+        if (options.print)
+            options.print(FormatText(kTextGridNothingGood, outcome.counts.points));
+        return false;
+    }
+    ResultGridSource source{Plan(), series.Header(), {}, series.StartDate(), series.StartTime()};
+    if (Status read = series.ReadCoordinates(&source.coordinates); !read)
+        return Fail(std::move(read));
+    series.Close();
+    if (Status written =
+            WriteResultGrids(source, ResultItems(root, document.Results(), layout), grids);
+        !written)
+        return Fail(Status::SystemFault(written.Text()));
+    outcome.end = BatchEnd::Written;
+    return true;
+}
+
+} // namespace ryn

@@ -1,0 +1,97 @@
+#pragma once
+
+#include <cstddef>
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "base/file_access.h"
+#include "run/batch_ports.h"
+#include "run/grid_batch.h"
+#include "run/point_series.h"
+#include "run/result_grids.h"
+#include "run/result_layout.h"
+
+namespace ryn {
+
+/// What is known of a point.
+enum class PointState : char { Inactive, Waiting, Good, Failed };
+
+/// The steps that a batch over a whole grid and one over a part of it have in common. Each gives
+/// false where the batch ends; the outcome then says how.
+///
+/// The document keeps the batch's ports, and the process the parameter file's directory, as long as
+/// the object lives.
+class BatchRun {
+  public:
+    /// Takes the results of a good point.
+    using TakeResults = std::function<void(int point, const std::vector<float>& results)>;
+
+    BatchRun(CRynEditDoc& analysed, const GridBatchOptions& wanted);
+    ~BatchRun();
+    BatchRun(const BatchRun&) = delete;
+    BatchRun& operator=(const BatchRun&) = delete;
+
+    /// Reads the plan, opens the grid, and tests whether the output can be written, before anything
+    /// is touched.
+    bool Prepare();
+    /// Finds out which points take part.
+    bool ReadActivity();
+    void SetActivity(const std::vector<bool>& active);
+
+    /// Runs the active points of a part of the grid over series in memory.
+    bool RunPart(const GridTile& part, const TakeResults& take);
+    /// Runs one point over its series, with the files that it leaves behind.
+    bool RunPoint(int point, CTsq0FileInfo& series, const TakeResults& take);
+    /// Takes over what was found of a point elsewhere.
+    void NotePoint(int point, PointState state);
+
+    /// Leaves the files that a batch on disk leaves behind its last point, which are those of that
+    /// point with the results of the last good one before it, and the document with the results of
+    /// the last good point.
+    bool LeaveLastFiles();
+    /// Writes the output grid file.
+    bool WriteOutput(ResultGrids& grids);
+
+    bool Fail(Status reason);
+    bool IsStopped();
+    ScratchFiles MakeScratch() const;
+    /// Bytes for a tile: what is wanted less all that is in memory beside it. Nothing, and a
+    /// failure, where that does not hold one point.
+    std::optional<std::size_t> MemoryForTile();
+
+    PointSeries& Series() { return series; }
+    const GridPlan& Plan() const { return series.Plan(); }
+    const ResultLayout& Layout() const { return layout; }
+    const std::vector<bool>& Active() const { return active; }
+    const std::vector<PointState>& States() const { return states; }
+    GridBatchOutcome& Outcome() { return outcome; }
+    CGlobalKvf& Root() { return root; }
+    /// The offsets of a point in the result grids.
+    GridPoint OffsetsOf(int point) const;
+
+  private:
+    Status TestFiles(const GridPlan& plan);
+    bool End(BatchEnd how, Status reason);
+    bool Take(int point, const PointOutcome& ended);
+    bool LeaveFilesOf(int point);
+    bool RunAgain(int point, PointTrace trace, PointOutcome* ended);
+    std::string KeptNameOf(int point) const;
+
+    CRynEditDoc& document;
+    CGlobalKvf& root;
+    const GridBatchOptions& options;
+    CurrentDirectoryScope directory;
+    BatchPorts ports;
+    PointAnalysis analysis;
+    PointSeries series;
+    ResultLayout layout;
+    std::vector<bool> active;
+    std::vector<PointState> states;
+    std::optional<ComputationLines> lines;
+    int done = 0; ///< points with a result, good or not
+    GridBatchOutcome outcome;
+};
+
+} // namespace ryn

@@ -1,0 +1,186 @@
+#include "run/point_series.h"
+
+#include <algorithm>
+#include <new>
+#include <span>
+
+#include "series/sts_item.h"
+#include "strings/catalogue.h"
+#include "tsq/tsq.h"
+
+namespace ryn {
+
+namespace {
+
+/// The points of a tile, in point order.
+template <typename Use>
+Next ForEachPlace(const GridPlan& plan, const GridTile& tile, Use use) {
+    const auto firstFrom = [](const IndexRange& range, int place) {
+        return range.first + (place - range.first + range.step - 1) / range.step * range.step;
+    };
+    for (int x = firstFrom(plan.x, tile.firstX); x < tile.firstX + tile.countX; x += plan.x.step)
+        for (int y = firstFrom(plan.y, tile.firstY); y < tile.firstY + tile.countY;
+             y += plan.y.step) {
+            const int point = (x - plan.x.first) / plan.x.step * plan.PointsY() +
+                              (y - plan.y.first) / plan.y.step;
+            const std::size_t place =
+                static_cast<std::size_t>(x - tile.firstX) * static_cast<std::size_t>(tile.countY) +
+                static_cast<std::size_t>(y - tile.firstY);
+            if (use(point, place * static_cast<std::size_t>(tile.countSteps)) == Next::Stop)
+                return Next::Stop;
+        }
+    return Next::GoOn;
+}
+
+Status StoreError(const CTsq0FileInfo& series) {
+    const Status reason = tsqTakeError();
+    return reason ? Status::SystemFault(FormatText(kTextGridSeriesNotMade, series.Path())) : reason;
+}
+
+Status NotEnoughMemory() {
+    return Status::SystemFault(std::string(Text(kTextGridOutOfMemory)));
+}
+
+} // namespace
+
+Status PointSeries::Open(const GridPlan& wanted) {
+    if (engine.OpenFile(wanted.gridFile, true) != kGridOk)
+        return engine.LastError();
+    header = engine.QueryHeaderInfo();
+    plan = wanted;
+    if (Status fault = TestPlan(plan, header); !fault)
+        return Status::InputFault(plan.gridFile + ": " + fault.Text());
+    const CQxDateTime origin = header.TimeOfStep(plan.firstStep);
+    startDate = origin.Format("%Y-%m-%d");
+    startTime = origin.Format("%H:%M:%S");
+    constexpr double kSecondsPerDay = 86400.0;
+    for (int t = plan.firstStep; t <= plan.lastStep; ++t)
+        seconds.push_back((static_cast<double>(header.TimeOfStep(t)) - origin) * kSecondsPerDay);
+    return Status::Ok();
+}
+
+Status PointSeries::ReadCoordinates(GridCoordinates* coordinates) {
+    return engine.ReadCoordinates(coordinates) == kGridOk ? Status::Ok() : engine.LastError();
+}
+
+std::size_t PointSeries::BytesOfPoint() const {
+    // Its series in the store, with times where steps differ, and its samples.
+    return static_cast<std::size_t>(plan.Steps()) *
+           (sizeof(float) + sizeof(double) + sizeof(STSItem));
+}
+
+Status PointSeries::ReadActivity(std::size_t memory, std::vector<bool>* active) try {
+    active->assign(static_cast<std::size_t>(plan.Points()), false);
+    GridTile firstStep = plan.Whole();
+    firstStep.countSteps = 1;
+    std::vector<GridTile> tiles;
+    if (engine.PlanTiles(firstStep, memory, &tiles) != kGridOk)
+        return engine.LastError();
+    std::vector<float> values;
+    for (const GridTile& tile : tiles) {
+        values.resize(tile.Values());
+        if (engine.ReadTile(tile, memory, values) != kGridOk)
+            return engine.LastError();
+        ForEachPlace(plan, tile, [&](int point, std::size_t offset) {
+            (*active)[static_cast<std::size_t>(point)] = values[offset] != header.DeleteValue();
+            return Next::GoOn;
+        });
+    }
+    return Status::Ok();
+} catch (const std::bad_alloc&) {
+    return NotEnoughMemory();
+}
+
+Status PointSeries::MakeOne(CTsq0FileInfo& series, int point, const float* values) {
+    const auto steps = static_cast<std::size_t>(plan.Steps());
+    const std::span<const float> history(values, steps);
+    withMissing += std::ranges::find(history, header.DeleteValue()) != history.end() ? 1 : 0;
+    const bool good = series.Create(header, point, plan.item, startDate, startTime, true) &&
+                      series.WriteValues(seconds.data(), values, steps) && series.Close();
+    return good ? Status::Ok() : StoreError(series);
+}
+
+Status
+PointSeries::ForEachPoint(const GridTile& part, std::size_t memory, const std::vector<bool>& active,
+                          ScratchFiles& scratch,
+                          const std::function<Next(int point, CTsq0FileInfo& series)>& use) try {
+    std::vector<GridTile> tiles;
+    if (engine.PlanTiles(part, memory, &tiles) != kGridOk)
+        return engine.LastError();
+    std::vector<float> values;
+    for (const GridTile& tile : tiles) {
+        values.resize(tile.Values());
+        if (engine.ReadTile(tile, memory, values) != kGridOk)
+            return engine.LastError();
+        Status made;
+        const Next next = ForEachPlace(plan, tile, [&](int point, std::size_t offset) {
+            if (!active[static_cast<std::size_t>(point)])
+                return Next::GoOn;
+            CTsq0FileInfo series(scratch);
+            const GridPoint place = plan.PointAt(point);
+            series.SetPosition(place.x, place.y);
+            made = MakeOne(series, point, values.data() + offset);
+            return made ? use(point, series) : Next::Stop;
+        });
+        if (next == Next::Stop)
+            return made;
+    }
+    return Status::Ok();
+} catch (const std::bad_alloc&) {
+    return NotEnoughMemory();
+}
+
+Status PointSeries::BeginAll(std::vector<CTsq0FileInfo>& points, int first, int end,
+                             const CQxArray2D<float>& plane) {
+    for (int p = first; p < end; ++p) {
+        CTsq0FileInfo& point = points[static_cast<std::size_t>(p)];
+        const float value = plane(point.Position().x, point.Position().y);
+        // A NaN is not equal, so that such a point takes part.
+        if (!point.Create(header, p, plan.item, startDate, startTime,
+                          value != header.DeleteValue()))
+            return StoreError(point);
+    }
+    return Status::Ok();
+}
+
+Status PointSeries::EndAll(std::vector<CTsq0FileInfo>& points, int first, int end) {
+    for (int p = first; p < end; ++p)
+        if (CTsq0FileInfo& point = points[static_cast<std::size_t>(p)]; !point.Close())
+            return StoreError(point);
+    return Status::Ok();
+}
+
+Status PointSeries::MakeSeries(std::vector<CTsq0FileInfo>& points, int first, int end,
+                               const std::function<bool()>& isStopped) try {
+    CGridEditSlice slice;
+    slice.Initilize(header, 0);
+    slice.SetDynamic(true);
+    slice.SetItem(plan.item);
+    slice.SetLayer(0);
+    std::vector<bool> hasMissing(static_cast<std::size_t>(end - first), false);
+    for (int t = plan.firstStep; t <= plan.lastStep && !isStopped(); ++t) {
+        slice.SetTimeStep(t);
+        if (engine.GetSlice(slice) != kGridOk)
+            return engine.LastError();
+        const CQxArray2D<float> plane = slice.GetArray();
+        (void)engine.ReturnSlice(slice, false);
+        if (t == plan.firstStep)
+            if (Status begun = BeginAll(points, first, end, plane); !begun)
+                return begun;
+        const double time = seconds[static_cast<std::size_t>(t - plan.firstStep)];
+        for (int p = first; p < end; ++p) {
+            CTsq0FileInfo& point = points[static_cast<std::size_t>(p)];
+            const float value = plane(point.Position().x, point.Position().y);
+            if (point.IsActive() && value == header.DeleteValue())
+                hasMissing[static_cast<std::size_t>(p - first)] = true;
+            if (!point.WriteValue(time, value))
+                return StoreError(point);
+        }
+    }
+    withMissing += static_cast<int>(std::ranges::count(hasMissing, true));
+    return isStopped() ? Status::Ok() : EndAll(points, first, end);
+} catch (const std::bad_alloc&) {
+    return NotEnoughMemory();
+}
+
+} // namespace ryn
