@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "apps/cli/nearest_names.h"
+#include "apps/cli/size_text.h"
 #include "base/number_text.h"
 #include "strings/catalogue.h"
 
@@ -117,6 +118,21 @@ void AddCountOption(CLI::App& command, const ValueOption& option, long* value) {
                 if (!count || *count < 0)
                     Refuse(name, text, kTextCliExpectInt);
                 *value = *count;
+            },
+            TextOf(option.helpTextId))
+        ->type_name(option.valueName);
+}
+
+void AddSizeOption(CLI::App& command, const ValueOption& option, std::size_t* bytes) {
+    const std::string name = option.names;
+    command
+        .add_option_function<std::string>(
+            option.names,
+            [bytes, name](const std::string& text) {
+                const std::optional<std::size_t> size = ParseSize(text);
+                if (!size)
+                    Refuse(name, text, kTextCliExpectSize);
+                *bytes = *size;
             },
             TextOf(option.helpTextId))
         ->type_name(option.valueName);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <functional>
 #include <optional>
 #include <span>
@@ -39,6 +40,8 @@ void AddTextOption(CLI::App& command, const ValueOption& option, std::optional<s
 void AddPlainTextOption(CLI::App& command, const ValueOption& option, std::string* value);
 /// A count from 0.
 void AddCountOption(CLI::App& command, const ValueOption& option, long* value);
+/// Bytes, as ParseSize takes them.
+void AddSizeOption(CLI::App& command, const ValueOption& option, std::size_t* bytes);
 /// A whole number of at least `least`.
 void AddIntOption(CLI::App& command, const ValueOption& option, int least,
                   std::optional<int>* value);

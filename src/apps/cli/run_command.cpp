@@ -1,21 +1,18 @@
 #include "apps/cli/run_command.h"
 
 #include <algorithm>
-#include <chrono>
 #include <cmath>
-#include <filesystem>
 #include <memory>
 #include <ostream>
-#include <sstream>
 #include <vector>
 
 #include "apps/cli/case_file.h"
 #include "apps/cli/command_options.h"
+#include "apps/cli/engine_log.h"
 #include "apps/cli/finding_lines.h"
 #include "apps/cli/json_output.h"
 #include "apps/cli/plain_text.h"
 #include "apps/cli/text_table.h"
-#include "base/file_access.h"
 #include "base/number_text.h"
 #include "results/number_rule.h"
 #include "run/run_command.h"
@@ -24,36 +21,6 @@
 namespace ryn::cli {
 
 namespace {
-
-constexpr std::size_t kLogLinesShown = 20;
-
-/// Whether the engine could write its log: one that was there before is an earlier run's.
-bool IsLogOfThisRun(const std::string& path, std::filesystem::file_time_type start) {
-    // File systems keep times to two seconds at worst.
-    constexpr std::chrono::seconds kCoarsest(2);
-    std::error_code error;
-    const auto written = std::filesystem::last_write_time(path, error);
-    return !error && written >= start - kCoarsest;
-}
-
-/// The last lines of the engine's log, on standard error. The log of a long list of combinations
-/// tells at its end what went wrong.
-void ShowLog(const std::string& path, bool isOfThisRun, Console& console) {
-    constexpr std::size_t kLargestLog = 64U << 20U;
-    std::string text;
-    if (!isOfThisRun || !ReadWholeFile(path, kLargestLog, &text)) {
-        ShowError(console, FormatText(kTextCliNoLog, path));
-        return;
-    }
-    std::vector<std::string> lines;
-    std::istringstream stream(text);
-    for (std::string line; std::getline(stream, line);)
-        lines.push_back(PlainLine(line));
-    ShowError(console, FormatText(kTextCliRunFailed, path));
-    const std::size_t first = lines.size() - std::min(lines.size(), kLogLinesShown);
-    for (std::size_t i = first; i < lines.size(); ++i)
-        console.err << "  " << lines[i] << '\n';
-}
 
 /// A row of the table: a name and one cell for each return period.
 void AddValues(TextTable& table, const std::string& name, const DoubleList& values,
@@ -165,12 +132,12 @@ int RunRun(const RunOptions& options, Console& console) {
     CaseFile file(console, Consent::Given);
     if (const int refused = file.Open(options.file))
         return refused;
-    const auto start = std::filesystem::file_time_type::clock::now();
+    const EngineLogWatch watch;
     const RunOutcome outcome = RunAnalysis(file.Document());
-    const bool hasLog = IsLogOfThisRun(outcome.logFile, start);
+    const bool hasLog = watch.HasSeen(outcome.logFile);
     ShowDetail(file, outcome, console);
     if (outcome.end == RunEnd::EngineFailed)
-        ShowLog(outcome.logFile, hasLog, console);
+        ShowEngineLog(outcome.logFile, hasLog, console);
     // What was computed is shown also where the result file could not be written.
     if (outcome.end != RunEnd::Succeeded && outcome.end != RunEnd::ResultsUnwritten)
         return ExitCodeOf(outcome);

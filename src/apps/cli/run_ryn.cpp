@@ -9,6 +9,7 @@
 #include "apps/cli/export_command.h"
 #include "apps/cli/extract_command.h"
 #include "apps/cli/fit_command.h"
+#include "apps/cli/grid_command.h"
 #include "apps/cli/import_command.h"
 #include "apps/cli/info_command.h"
 #include "apps/cli/new_command.h"
@@ -48,6 +49,7 @@ int RunCommand(const std::vector<std::string>& arguments, Console& console) {
     AddExtractCommand(line);
     AddRunCommand(line);
     AddShowCommand(line);
+    AddGridCommand(line);
     AddFitCommand(line);
     AddSelfCheckCommand(line);
     return line.Run(arguments, console);
