@@ -23,7 +23,7 @@ std::string TemporaryDirectory(const std::string& otherDirectory) {
 /// Drawn, so that nobody can lay a link of that name in a directory that all may write.
 std::string RandomLetters() {
     constexpr std::string_view kLetters = "abcdefghijklmnopqrstuvwxyz234567";
-    std::random_device source;
+    static thread_local std::random_device source; // opening one takes longer than drawing
     std::string text;
     for (int i = 0; i < 2; ++i)
         for (unsigned bits = source(), n = 0; n < 6; ++n, bits /= 32)
