@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "base/process_limits.h"
 #include "strings/catalogue.h"
 
 namespace ryn {
@@ -12,6 +13,10 @@ namespace {
 constexpr int kPointsOfALine = 200;
 
 } // namespace
+
+int PointsInChunk() {
+    return std::max(1, static_cast<int>(0.8 * LimitOfOpenFiles()));
+}
 
 std::string CreatedLine(int created, int remaining) {
     return FormatText(kTextGridCreated, created, remaining);

@@ -10,6 +10,9 @@ namespace ryn {
 /// What a batch prints on its standard output; each text ends its line.
 using PrintLine = std::function<void(const std::string&)>;
 
+/// Points whose series are open at one time: 80 % of the limit of open files, and 1 at least.
+int PointsInChunk();
+
 /// Prints the line of one chunk of series files for each chunk of `chunkSize` points, the last one
 /// with none remaining.
 void PrintCreatedLines(const std::vector<bool>& active, int chunkSize, const PrintLine& print);

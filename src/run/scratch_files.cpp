@@ -37,6 +37,21 @@ ScratchFiles ScratchFiles::OnDisk(const std::string& otherDirectory) {
     return ScratchFiles(TemporaryDirectory(otherDirectory));
 }
 
+ScratchFiles ScratchFiles::InOwnDirectory(const std::string& otherDirectory) {
+    ScratchFiles made(
+        WithTrailingSeparator(TemporaryDirectory(otherDirectory) + "RYNTsq0_" + RandomLetters()));
+    made.ownDirectory = made.directory;
+    std::error_code error; // a directory that is not there is found out by the first file
+    std::filesystem::create_directory(made.directory, error);
+    return made;
+}
+
+ScratchFiles::~ScratchFiles() {
+    std::error_code error;
+    if (!ownDirectory.empty())
+        std::filesystem::remove(ownDirectory, error); // empty, since points take theirs away
+}
+
 // A directory that does not exist on disk: no other data file may be taken for one in memory.
 ScratchFiles ScratchFiles::InMemory(const std::string& otherDirectory) {
     ScratchFiles made(
