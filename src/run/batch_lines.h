@@ -23,7 +23,8 @@ int WholeMinutes(double days);
 
 /// The lines that tell how far the computation of the points has come: one at each 200th computed
 /// point, left out where that point failed. Points may be computed in any order: which lines there
-/// are, and their order, are those of computing them in point order.
+/// are, and their order, are those of computing them in point order, unless a line would have to
+/// wait for its point longer than a minute.
 class ComputationLines {
   public:
     /// Time counts from here. `print` may be empty.
@@ -36,6 +37,7 @@ class ComputationLines {
     enum class Known : char { No, Good, Failed };
 
     void PrintSettled();
+    double DaysSinceStart() const;
 
     PrintLine print;
     std::chrono::steady_clock::time_point start;

@@ -89,6 +89,17 @@ bool BatchRun::Prepare() {
     return fault ? true : End(BatchEnd::Refused, std::move(fault));
 }
 
+/// A grid that stays in the system's cache is read in tiles of a size that the processor's caches
+/// and its address tables serve well; for one that does not, long runs on the disk count for more.
+std::size_t BatchRun::TileBytes(double allowed) const {
+    constexpr double kWellServed = 256 * kMebibyte;
+    const double whole = static_cast<double>(Plan().Whole().Values()) * sizeof(float);
+    const bool staysInCache = whole <= static_cast<double>(UsableMemory()) / 2;
+    const double least = 16.0 * Plan().Steps();
+    return static_cast<std::size_t>(staysInCache ? std::min(allowed, std::max(kWellServed, least))
+                                                 : allowed);
+}
+
 std::optional<std::size_t> BatchRun::MemoryForTile() {
     const double wanted =
         static_cast<double>(options.memory != 0 ? options.memory : UsableMemory() / 4);
@@ -97,7 +108,7 @@ std::optional<std::size_t> BatchRun::MemoryForTile() {
                           static_cast<double>(series.BytesOfPoint()) + kFixedBytes;
     const double tile = std::max(slice, 8.0 * Plan().Steps());
     if (beside + tile <= wanted)
-        return static_cast<std::size_t>(wanted - beside);
+        return TileBytes(wanted - beside);
     End(BatchEnd::Refused,
         Status::SystemFault(
             FormatText(kTextGridMemoryTooSmall, (beside + tile) / kMebibyte, wanted / kMebibyte)));

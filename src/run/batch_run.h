@@ -90,6 +90,7 @@ class BatchRun {
     bool Take(int point, const PointOutcome& ended);
     bool LeaveFilesOf(int point);
     bool RunAgain(int point, PointTrace trace, PointOutcome* ended);
+    std::size_t TileBytes(double allowed) const;
     bool LeavesEachPointsFiles() const;
     std::string KeptNameOf(int point) const;
 
