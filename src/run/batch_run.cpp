@@ -81,12 +81,14 @@ bool BatchRun::Prepare() {
         return End(BatchEnd::Refused,
                    Status::InputFault(document.GetPathName() + ": " + fault.Text()));
     outcome.outputFile = plan.outputFile;
-    outcome.counts.points = plan.Points();
-    resultBytes = ResultGrids::BytesFor(layout, plan);
     Status fault = series.Open(plan);
     if (fault)
         fault = TestFiles(plan);
-    return fault ? true : End(BatchEnd::Refused, std::move(fault));
+    if (!fault)
+        return End(BatchEnd::Refused, std::move(fault));
+    outcome.counts.points = plan.Points();
+    resultBytes = ResultGrids::BytesFor(layout, plan);
+    return true;
 }
 
 /// A grid that stays in the system's cache is read in tiles of a size that the processor's caches

@@ -247,6 +247,12 @@ constexpr std::array kEntries = std::to_array<Entry>({
      "%s に %d / %d 格子点の結果があります"},
     {kTextCliGridNotWanted, "%s: no grid batch, since Tsq2Input.UseTsq2Input is false",
      "%s: Tsq2Input.UseTsq2Input が false なので格子の一括解析は行いません"},
+    {kTextCliGridAllMissing,
+     "all points are missing at the first time step, which decides whether a point takes part; "
+     "Tsq2Input.Time_Range_And_Interval can begin later",
+     "最初の時刻ですべての格子点が欠測です。その時刻で解析の対象が決まります。"
+     "Tsq2Input.Time_Range_And_Interval を後の時刻から始めることができます"},
+    {kTextCliGridLastPoint, "the last point: %s", "最後の格子点: %s"},
     {kTextCliGridTilesUnfit,
      "tiles of another analysis, grid file or version of the program: %s; run their parts again",
      "別の解析、格子ファイルまたはプログラムの版のタイルです: %s。その部分を再度実行してください"},

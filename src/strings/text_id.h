@@ -152,6 +152,8 @@ enum TextId : int {
     kTextCliGridFailed,
     kTextCliGridWritten,
     kTextCliGridNotWanted,
+    kTextCliGridAllMissing,
+    kTextCliGridLastPoint,
     kTextCliGridTilesUnfit,
     kTextCliGridTilesMissing,
     kTextCliGridPartsMissing,

@@ -59,6 +59,10 @@ int ShowEnd(const GridBatchOutcome& outcome, bool hasLog, const CaseFile& file, 
         return Report(console,
                       Status::InputFault(FormatText(kTextCliGridNotWanted, file.ShownName())));
     case BatchEnd::NothingGood:
+        ShowError(console, outcome.counts.active == 0
+                               ? std::string(Text(kTextCliGridAllMissing))
+                               : FormatText(kTextCliGridLastPoint,
+                                            hasLog ? LastErrorIn(outcome.logFile) : ""));
         return kExitAnalysis;
     case BatchEnd::SetUpFailed:
         ShowEngineLog(outcome.logFile, hasLog, console);
