@@ -184,6 +184,11 @@ EGridEditErrors CGridEditEngine::PlanTiles(const GridTile& whole, std::size_t me
     return grid ? Take(grid->PlanTiles(whole, memoryLimit, tiles), kGridBadRequest) : NoFile();
 }
 
+EGridEditErrors CGridEditEngine::DividePlane(const GridTile& whole, int pieces,
+                                             std::vector<GridTile>* tiles) {
+    return grid ? Take(grid->DividePlane(whole, pieces, tiles), kGridBadRequest) : NoFile();
+}
+
 EGridEditErrors CGridEditEngine::ReadTile(const GridTile& tile, std::size_t memoryLimit,
                                           std::span<float> values) {
     if (!grid)

@@ -93,6 +93,19 @@ Status GridFile::PlanTiles(const GridTile& whole, std::size_t limitBytes,
         return file.InputFault("the memory allowed, " + std::to_string(limitBytes) +
                                " bytes, does not hold the " + std::to_string(whole.countSteps) +
                                " steps of one point");
+    *tiles = CutPlane(whole, points);
+    return Status::Ok();
+}
+
+Status GridFile::DividePlane(const GridTile& whole, int pieces,
+                             std::vector<GridTile>* tiles) const {
+    if (Status status = CheckTile(whole); !status)
+        return status;
+    *tiles = CutPlane(whole, std::max<std::size_t>(1, whole.Points() / Size(std::max(1, pieces))));
+    return Status::Ok();
+}
+
+std::vector<GridTile> GridFile::CutPlane(const GridTile& whole, std::size_t points) const {
     const BlockReader reader(file, Item(whole.item), whole.layer);
     // Tiles grow along the faster of the two first, whichever comes first in the file.
     const bool isXFaster = Item(whole.item).xPlace > Item(whole.item).yPlace;
@@ -114,8 +127,7 @@ Status GridFile::PlanTiles(const GridTile& whole, std::size_t limitBytes,
             tile.countY = static_cast<int>(across.count);
             planned.push_back(tile);
         }
-    *tiles = std::move(planned);
-    return Status::Ok();
+    return planned;
 }
 
 std::size_t GridFile::ScratchOf(std::size_t limitBytes) {

@@ -34,6 +34,8 @@ class GridFile {
     /// CGridEditEngine::PlanTiles.
     Status PlanTiles(const GridTile& whole, std::size_t limitBytes,
                      std::vector<GridTile>* tiles) const;
+    /// CGridEditEngine::DividePlane.
+    Status DividePlane(const GridTile& whole, int pieces, std::vector<GridTile>* tiles) const;
     /// CGridEditEngine::ReadTile.
     Status ReadTile(const GridTile& tile, std::size_t scratchBytes, std::span<float> values) const;
     /// Whole planes one behind the other, x fast.
@@ -53,6 +55,8 @@ class GridFile {
     const GridVariable& Item(int item) const {
         return layout.items[static_cast<std::size_t>(item - 1)];
     }
+    /// Tiles of at most `points` places.
+    std::vector<GridTile> CutPlane(const GridTile& whole, std::size_t points) const;
     Status ReadInto(const GridTile& tile, std::array<std::ptrdiff_t, 3> stride,
                     std::size_t scratchBytes, std::span<float> values) const;
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "base/process_limits.h"
 #include "strings/catalogue.h"
 
 namespace ryn {
@@ -12,6 +13,10 @@ namespace {
 constexpr int kPointsOfALine = 200;
 
 } // namespace
+
+int PointsInChunk() {
+    return std::max(1, static_cast<int>(0.8 * LimitOfOpenFiles()));
+}
 
 std::string CreatedLine(int created, int remaining) {
     return FormatText(kTextGridCreated, created, remaining);
@@ -46,16 +51,24 @@ void ComputationLines::Computed(int point, bool good) {
     if (found != milestones.end() && *found == point)
         known[static_cast<std::size_t>(found - milestones.begin())] =
             good ? Known::Good : Known::Failed;
-    if (++computed % kPointsOfALine == 0) {
-        using Days = std::chrono::duration<double, std::ratio<86400>>;
-        elapsed.push_back(Days(std::chrono::steady_clock::now() - start).count());
-    }
+    if (++computed % kPointsOfALine == 0)
+        elapsed.push_back(DaysSinceStart());
     PrintSettled();
 }
 
-// A line waits for its own point, which another part of the grid may hold, and for those before it.
+double ComputationLines::DaysSinceStart() const {
+    using Days = std::chrono::duration<double, std::ratio<86400>>;
+    return Days(std::chrono::steady_clock::now() - start).count();
+}
+
+// A line waits for its own point, which another part of the grid may hold, and for the lines before
+// it; but not for long, since the log of a run of hours must not stay silent until its end.
 void ComputationLines::PrintSettled() {
-    for (; settled < elapsed.size() && known[settled] != Known::No; ++settled) {
+    constexpr double kPatience = 1.0 / 1440.0; // days
+    const auto isSettled = [this](std::size_t line) {
+        return known[line] != Known::No || DaysSinceStart() - elapsed[line] > kPatience;
+    };
+    for (; settled < elapsed.size() && isSettled(settled); ++settled) {
         if (known[settled] == Known::Failed || !print)
             continue;
         const int count = static_cast<int>(settled + 1) * kPointsOfALine;

@@ -10,6 +10,9 @@ namespace ryn {
 /// What a batch prints on its standard output; each text ends its line.
 using PrintLine = std::function<void(const std::string&)>;
 
+/// Points whose series are open at one time: 80 % of the limit of open files, and 1 at least.
+int PointsInChunk();
+
 /// Prints the line of one chunk of series files for each chunk of `chunkSize` points, the last one
 /// with none remaining.
 void PrintCreatedLines(const std::vector<bool>& active, int chunkSize, const PrintLine& print);
@@ -20,7 +23,8 @@ int WholeMinutes(double days);
 
 /// The lines that tell how far the computation of the points has come: one at each 200th computed
 /// point, left out where that point failed. Points may be computed in any order: which lines there
-/// are, and their order, are those of computing them in point order.
+/// are, and their order, are those of computing them in point order, unless a line would have to
+/// wait for its point longer than a minute.
 class ComputationLines {
   public:
     /// Time counts from here. `print` may be empty.
@@ -33,6 +37,7 @@ class ComputationLines {
     enum class Known : char { No, Good, Failed };
 
     void PrintSettled();
+    double DaysSinceStart() const;
 
     PrintLine print;
     std::chrono::steady_clock::time_point start;

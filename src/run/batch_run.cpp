@@ -19,14 +19,15 @@ constexpr double kFixedBytes = 24 * kMebibyte;
 
 } // namespace
 
-BatchRun::BatchRun(CRynEditDoc& analysed, const GridBatchOptions& wanted)
+BatchRun::BatchRun(CRynEditDoc& analysed, const GridBatchOptions& wanted, BatchShare ofAll)
     : document(analysed),
       root(analysed.GetGlobalKvf()),
       options(wanted),
       directory(SplitPath(analysed.GetPathName()).directory),
       ports(analysed),
       analysis(analysed, wanted.engines),
-      layout(ResultLayout::Of(root)) {
+      layout(ResultLayout::Of(root)),
+      share(ofAll) {
     outcome.logFile = LogFileOf(root.DefineEVS().OutputFileName);
     // The next point overwrites its files.
     document.SetDurability(Durability::Unflushed);
@@ -80,27 +81,56 @@ bool BatchRun::Prepare() {
         return End(BatchEnd::Refused,
                    Status::InputFault(document.GetPathName() + ": " + fault.Text()));
     outcome.outputFile = plan.outputFile;
-    outcome.counts.points = plan.Points();
     Status fault = series.Open(plan);
     if (fault)
         fault = TestFiles(plan);
-    return fault ? true : End(BatchEnd::Refused, std::move(fault));
+    if (!fault)
+        return End(BatchEnd::Refused, std::move(fault));
+    outcome.counts.points = plan.Points();
+    resultBytes = ResultGrids::BytesFor(layout, plan);
+    return true;
+}
+
+/// A grid that stays in the system's cache is read in tiles of a size that the processor's caches
+/// and its address tables serve well; for one that does not, long runs on the disk count for more.
+std::size_t BatchRun::TileBytes(double allowed) const {
+    constexpr double kWellServed = 256 * kMebibyte;
+    const double whole = static_cast<double>(Plan().Whole().Values()) * sizeof(float);
+    const bool staysInCache = whole <= static_cast<double>(UsableMemory()) / 2;
+    const double least = 16.0 * Plan().Steps();
+    return static_cast<std::size_t>(staysInCache ? std::min(allowed, std::max(kWellServed, least))
+                                                 : allowed);
 }
 
 std::optional<std::size_t> BatchRun::MemoryForTile() {
     const double wanted =
         static_cast<double>(options.memory != 0 ? options.memory : UsableMemory() / 4);
     const double slice = static_cast<double>(Plan().Whole().Points()) * sizeof(float);
-    const double beside = ResultGrids::BytesFor(layout, Plan()) + 2.0 * slice +
-                          2.0 * Plan().Points() + static_cast<double>(series.BytesOfPoint()) +
-                          kFixedBytes;
+    const double beside = resultBytes + 2.0 * slice + 2.0 * Plan().Points() +
+                          static_cast<double>(series.BytesOfPoint()) + kFixedBytes;
     const double tile = std::max(slice, 8.0 * Plan().Steps());
     if (beside + tile <= wanted)
-        return static_cast<std::size_t>(wanted - beside);
+        return TileBytes(wanted - beside);
     End(BatchEnd::Refused,
         Status::SystemFault(
             FormatText(kTextGridMemoryTooSmall, (beside + tile) / kMebibyte, wanted / kMebibyte)));
     return std::nullopt;
+}
+
+void BatchRun::ExpectResultsOf(int points) {
+    // As numbers, as a tree, and as the text of it.
+    constexpr double kBytesOfNumber = 64.0;
+    resultBytes = kBytesOfNumber * static_cast<double>(layout.Items()) * points;
+}
+
+void BatchRun::PrintCreatedLines() {
+    ryn::PrintCreatedLines(active, PointsInChunk(), options.print);
+}
+
+std::vector<int> BatchRun::PointsOf(const GridTile& part) const {
+    std::vector<int> points = series.PointsOf(part);
+    std::erase_if(points, [this](int point) { return !active[static_cast<std::size_t>(point)]; });
+    return points;
 }
 
 bool BatchRun::ReadActivity() {
@@ -129,6 +159,10 @@ GridPoint BatchRun::OffsetsOf(int point) const {
     return {place.x - Plan().x.first, place.y - Plan().y.first};
 }
 
+bool BatchRun::LeavesEachPointsFiles() const {
+    return options.scratch == Scratch::Disk && share == BatchShare::Whole;
+}
+
 std::string BatchRun::KeptNameOf(int point) const {
     if (!root.GridInput().SaveEVS)
         return {};
@@ -140,8 +174,10 @@ std::string BatchRun::KeptNameOf(int point) const {
 
 ScratchFiles BatchRun::MakeScratch() const {
     const std::string other = SplitPath(document.GetPathName()).directory;
-    return options.scratch == Scratch::Disk ? ScratchFiles::OnDisk(other)
-                                            : ScratchFiles::InMemory(other);
+    if (options.scratch == Scratch::Memory)
+        return ScratchFiles::InMemory(other);
+    return share == BatchShare::Whole ? ScratchFiles::OnDisk(other)
+                                      : ScratchFiles::InOwnDirectory(other);
 }
 
 void BatchRun::NotePoint(int point, PointState state) {
@@ -163,7 +199,7 @@ bool BatchRun::Take(int point, const PointOutcome& ended) {
         return true;
     }
     ++outcome.counts.computed;
-    if (options.scratch == Scratch::Memory && !LeaveFilesOf(point))
+    if (!LeavesEachPointsFiles() && !LeaveFilesOf(point))
         return false;
     outcome.end = BatchEnd::SetUpFailed;
     document.GetPorts().textViewer->ViewTextFile(outcome.logFile);
@@ -176,7 +212,7 @@ bool BatchRun::RunPoint(int point, CTsq0FileInfo& files, const TakeResults& take
     const int before = ports.ExtractionsWithMissingYears();
     const PointOutcome ended =
         analysis.Run({files.Path(), files.NameSeries(), KeptNameOf(point)},
-                     options.scratch == Scratch::Disk ? PointTrace::Files : PointTrace::None);
+                     LeavesEachPointsFiles() ? PointTrace::Files : PointTrace::None);
     outcome.counts.withMissingYears += ports.ExtractionsWithMissingYears() - before;
     if (ended.end == PointEnd::Good)
         take(point, PointResults(document.Results(), layout, series.Header().DeleteValue()));

@@ -18,6 +18,10 @@ namespace ryn {
 /// What is known of a point.
 enum class PointState : char { Inactive, Waiting, Good, Failed };
 
+/// Whether a process runs all points of a batch or a share of them. A share leaves no files of
+/// single points behind, which other shares would leave too.
+enum class BatchShare { Whole, Part };
+
 /// The steps that a batch over a whole grid and one over a part of it have in common. Each gives
 /// false where the batch ends; the outcome then says how.
 ///
@@ -28,7 +32,8 @@ class BatchRun {
     /// Takes the results of a good point.
     using TakeResults = std::function<void(int point, const std::vector<float>& results)>;
 
-    BatchRun(CRynEditDoc& analysed, const GridBatchOptions& wanted);
+    BatchRun(CRynEditDoc& analysed, const GridBatchOptions& wanted,
+             BatchShare ofAll = BatchShare::Whole);
     ~BatchRun();
     BatchRun(const BatchRun&) = delete;
     BatchRun& operator=(const BatchRun&) = delete;
@@ -36,9 +41,17 @@ class BatchRun {
     /// Reads the plan, opens the grid, and tests whether the output can be written, before anything
     /// is touched.
     bool Prepare();
+    /// How many points' results are in memory at one time; without this call those of the whole
+    /// grid.
+    void ExpectResultsOf(int points);
     /// Finds out which points take part.
     bool ReadActivity();
     void SetActivity(const std::vector<bool>& active);
+
+    /// Prints the lines of the chunks of series.
+    void PrintCreatedLines();
+    /// The active points of a part of the grid, by number.
+    std::vector<int> PointsOf(const GridTile& part) const;
 
     /// Runs the active points of a part of the grid over series in memory.
     bool RunPart(const GridTile& part, const TakeResults& take);
@@ -77,6 +90,8 @@ class BatchRun {
     bool Take(int point, const PointOutcome& ended);
     bool LeaveFilesOf(int point);
     bool RunAgain(int point, PointTrace trace, PointOutcome* ended);
+    std::size_t TileBytes(double allowed) const;
+    bool LeavesEachPointsFiles() const;
     std::string KeptNameOf(int point) const;
 
     CRynEditDoc& document;
@@ -87,6 +102,8 @@ class BatchRun {
     PointAnalysis analysis;
     PointSeries series;
     ResultLayout layout;
+    BatchShare share;
+    double resultBytes = 0.0;
     std::vector<bool> active;
     std::vector<PointState> states;
     std::optional<ComputationLines> lines;

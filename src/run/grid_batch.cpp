@@ -5,7 +5,6 @@
 #include <vector>
 
 #include "base/path_parts.h"
-#include "base/process_limits.h"
 #include "base/stop_signals.h"
 #include "document/parameter_file_name.h"
 #include "run/batch_run.h"
@@ -13,11 +12,6 @@
 namespace ryn {
 
 namespace {
-
-/// Points in one walk through the time steps: 80 % of the limit of open files.
-int ChunkSize() {
-    return std::max(1, static_cast<int>(0.8 * LimitOfOpenFiles()));
-}
 
 /// One batch over a whole grid.
 class GridBatch {
@@ -65,7 +59,7 @@ bool GridBatch::MakeSeriesOnDisk(std::vector<CTsq0FileInfo>& points) {
     if (!memory)
         return false;
     const int count = run.Plan().Points();
-    const int chunk = ChunkSize();
+    const int chunk = PointsInChunk();
     const auto fitting = static_cast<int>(std::clamp<std::size_t>(
         *memory / run.Series().BytesOfPoint(), 1, static_cast<std::size_t>(chunk)));
     int created = 0;
@@ -112,7 +106,8 @@ bool GridBatch::ComputeOnDisk() {
 bool GridBatch::ComputeInMemory() {
     if (!run.ReadActivity())
         return false;
-    PrintCreatedLines(run.Active(), ChunkSize(), [this](const std::string& line) { Print(line); });
+    if (options.print)
+        run.PrintCreatedLines();
     MakeGrids();
     return run.RunPart(run.Plan().Whole(), IntoGrids()) && run.LeaveLastFiles();
 }

@@ -55,8 +55,6 @@ Status MakeGridPlan(const CTsq2InputKvf& input, const std::string& baseDirectory
                               TestRange(kTime, {time.first, time.last, 1})});
         !fault)
         return fault;
-    if (PlacesOf(input.X_Range_And_Interval) * PlacesOf(input.Y_Range_And_Interval) > INT_MAX)
-        return Status::InputFault(std::string(Text(kTextGridTooManyPoints)));
     plan->gridFile = FullPath(input.Tsq2InputFile, baseDirectory);
     plan->outputFile = FullPath(input.Tsq2OutputFile, baseDirectory);
     plan->title = input.Tsq2OutputFile;
@@ -71,9 +69,15 @@ Status MakeGridPlan(const CTsq2InputKvf& input, const std::string& baseDirectory
 Status TestPlan(const GridPlan& plan, const CGridEditHeaderInfo& grid) {
     if (plan.item < 1 || plan.item > grid.Items())
         return Status::InputFault(FormatText(kTextGridItemMissing, plan.item, grid.Items()));
-    return First({TestInside(kX, plan.x.first, plan.x.last, grid.SizeX()),
-                  TestInside(kY, plan.y.first, plan.y.last, grid.SizeY()),
-                  TestInside(kTime, plan.firstStep, plan.lastStep, grid.TimeStepPast())});
+    if (Status fault =
+            First({TestInside(kX, plan.x.first, plan.x.last, grid.SizeX()),
+                   TestInside(kY, plan.y.first, plan.y.last, grid.SizeY()),
+                   TestInside(kTime, plan.firstStep, plan.lastStep, grid.TimeStepPast())});
+        !fault)
+        return fault;
+    return PlacesOf(plan.x) * PlacesOf(plan.y) <= INT_MAX
+               ? Status::Ok()
+               : Status::InputFault(std::string(Text(kTextGridTooManyPoints)));
 }
 
 } // namespace ryn

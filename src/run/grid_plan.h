@@ -46,10 +46,11 @@ struct GridPlan {
 
 /// Makes the plan of section Tsq2Input, whose file names count from `baseDirectory`. Refused with
 /// one line: a file that is not named, ranges that go backward, begin below 0 or have a step below
-/// 1, more points than a 32-bit number counts.
+/// 1.
 Status MakeGridPlan(const CTsq2InputKvf& input, const std::string& baseDirectory, GridPlan* plan);
 
-/// Whether the grid has the plan's item, places and time steps.
+/// Whether the grid has the plan's item, places and time steps, and the points can be counted by a
+/// 32-bit number. Before this says so the plan's counts mean nothing.
 Status TestPlan(const GridPlan& plan, const CGridEditHeaderInfo& grid);
 
 } // namespace ryn

@@ -4,7 +4,6 @@
 #include <system_error>
 
 #include "base/path_parts.h"
-#include "base/qx_path.h"
 #include "results/result_file.h"
 #include "tsq/tsq.h"
 
@@ -87,10 +86,11 @@ Status PointAnalysis::SaveAndLoad(KvfHandle* input, bool* isRead) {
     return Status::Ok();
 }
 
-/// The tree that a save would write and a load would give back: every type survives the text.
+/// The tree that a save would write and a load would give back, but for names of files, which stay
+/// absolute here: every type survives the text.
 KvfHandle PointAnalysis::MakeTree() {
     KvfHandle tree = kvfCreate();
-    root.Write(tree.get(), CQxPath(parameterFile).GetDirectoryName());
+    root.Write(tree.get(), "");
     return tree;
 }
 

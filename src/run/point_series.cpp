@@ -63,6 +63,20 @@ Status PointSeries::ReadCoordinates(GridCoordinates* coordinates) {
     return engine.ReadCoordinates(coordinates) == kGridOk ? Status::Ok() : engine.LastError();
 }
 
+Status PointSeries::Divide(int pieces, std::vector<GridTile>* tiles) {
+    return engine.DividePlane(plan.Whole(), pieces, tiles) == kGridOk ? Status::Ok()
+                                                                      : engine.LastError();
+}
+
+std::vector<int> PointSeries::PointsOf(const GridTile& part) const {
+    std::vector<int> points;
+    ForEachPlace(plan, part, [&points](int point, std::size_t /*offset*/) {
+        points.push_back(point);
+        return Next::GoOn;
+    });
+    return points;
+}
+
 std::size_t PointSeries::BytesOfPoint() const {
     // Its series in the store, with times where steps differ, and its samples.
     return static_cast<std::size_t>(plan.Steps()) *

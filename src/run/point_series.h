@@ -33,6 +33,11 @@ class PointSeries {
     const std::string& StartTime() const { return startTime; }
     Status ReadCoordinates(GridCoordinates* coordinates);
 
+    /// CGridEditEngine::DividePlane for the plan's part of the grid.
+    Status Divide(int pieces, std::vector<GridTile>* tiles);
+    /// The numbers of the points in a part of the grid, in point order.
+    std::vector<int> PointsOf(const GridTile& part) const;
+
     /// Bytes that one point costs beside its tile.
     std::size_t BytesOfPoint() const;
 

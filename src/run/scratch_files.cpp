@@ -23,7 +23,7 @@ std::string TemporaryDirectory(const std::string& otherDirectory) {
 /// Drawn, so that nobody can lay a link of that name in a directory that all may write.
 std::string RandomLetters() {
     constexpr std::string_view kLetters = "abcdefghijklmnopqrstuvwxyz234567";
-    std::random_device source;
+    static thread_local std::random_device source; // opening one takes longer than drawing
     std::string text;
     for (int i = 0; i < 2; ++i)
         for (unsigned bits = source(), n = 0; n < 6; ++n, bits /= 32)
@@ -35,6 +35,21 @@ std::string RandomLetters() {
 
 ScratchFiles ScratchFiles::OnDisk(const std::string& otherDirectory) {
     return ScratchFiles(TemporaryDirectory(otherDirectory));
+}
+
+ScratchFiles ScratchFiles::InOwnDirectory(const std::string& otherDirectory) {
+    ScratchFiles made(
+        WithTrailingSeparator(TemporaryDirectory(otherDirectory) + "RYNTsq0_" + RandomLetters()));
+    made.ownDirectory = made.directory;
+    std::error_code error; // a directory that is not there is found out by the first file
+    std::filesystem::create_directory(made.directory, error);
+    return made;
+}
+
+ScratchFiles::~ScratchFiles() {
+    std::error_code error;
+    if (!ownDirectory.empty())
+        std::filesystem::remove(ownDirectory, error); // empty, since points take theirs away
 }
 
 // A directory that does not exist on disk: no other data file may be taken for one in memory.

@@ -1,7 +1,8 @@
 #pragma once
 
-#include <optional>
+#include <memory>
 #include <string>
+#include <utility>
 
 #include "tsq/tsq.h"
 
@@ -14,7 +15,14 @@ class ScratchFiles {
     /// In the directory of the environment's TMPDIR or, where that names none, in
     /// `otherDirectory`.
     static ScratchFiles OnDisk(const std::string& otherDirectory);
+    /// In a new directory there, which goes with the object: for one of several processes.
+    static ScratchFiles InOwnDirectory(const std::string& otherDirectory);
     static ScratchFiles InMemory(const std::string& otherDirectory);
+
+    ~ScratchFiles();
+    ScratchFiles(ScratchFiles&& other) = default;
+    ScratchFiles(const ScratchFiles&) = delete;
+    ScratchFiles& operator=(const ScratchFiles&) = delete;
 
     /// A name that no file has, made of "RYNTsq0_<point>_" and letters drawn at random; absolute,
     /// without extension.
@@ -27,6 +35,7 @@ class ScratchFiles {
 
     std::string directory; // with its trailing separator
     std::unique_ptr<TsqMemoryDirectory> memory;
+    std::string ownDirectory;
 };
 
 } // namespace ryn

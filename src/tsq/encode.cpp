@@ -160,8 +160,9 @@ class Encoder {
     void Describe(int variable, const TsqGridCoordinates::Axis& given, const char* axis, int unit,
                   const char* standardName, const char* geographicUnit) {
         out.PutText(variable, "axis", axis);
+        const bool needsName = given.standardName.empty() && IsGeographic(unit);
         if (!given.values.empty())
-            PutDescription(variable, given.standardName, given.units);
+            PutDescription(variable, needsName ? standardName : given.standardName, given.units);
         else if (IsGeographic(unit))
             PutDescription(variable, standardName, geographicUnit);
         else if (unit != kUnitUndefined)

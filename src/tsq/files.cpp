@@ -92,7 +92,7 @@ int OpenForReading(const std::string& path, TimeOrder order, TsqHeaderHandle* he
     TsqHeaderHandle readHeader(new TsqHeader);
     std::unique_ptr<StepSource> source;
     // Memory files are known by their absolute path; disk files keep the name that messages show.
-    const std::string full = FullPath(path);
+    const std::string full = MemoryStore::Instance().AbsolutePath(path);
     const Status status = MemoryStore::Instance().Covers(full)
                               ? OpenInMemory(full, readHeader.get(), &source)
                               : OpenNetcdf(path, order, readHeader.get(), &source);
@@ -118,8 +118,8 @@ int tsqFileReadUnordered(const std::string& path, TsqHeaderHandle* header, TsqFi
 }
 
 bool tsqFileExists(const std::string& path) {
-    const std::string full = FullPath(path);
     MemoryStore& store = MemoryStore::Instance();
+    const std::string full = store.AbsolutePath(path);
     return store.Covers(full) ? store.Find(full) != nullptr : CanOpenForReading(path);
 }
 
@@ -203,8 +203,8 @@ int tsqFileClose(TsqHeader* /*header*/, TsqFileHandle* file) {
 
 Status tsqCopyFile(const std::string& from, const std::string& to) try {
     MemoryStore& store = MemoryStore::Instance();
-    const std::string source = FullPath(from);
-    const std::string target = FullPath(to);
+    const std::string source = store.AbsolutePath(from);
+    const std::string target = store.AbsolutePath(to);
     const bool isFromMemory = store.Covers(source);
     const bool isToMemory = store.Covers(target);
     if (!isFromMemory && !isToMemory)

@@ -119,7 +119,7 @@ TsqMemoryDirectory::~TsqMemoryDirectory() {
 }
 
 bool TsqMemoryDirectory::Remove(const std::string& path) {
-    const std::string full = FullPath(path);
+    const std::string full = MemoryStore::Instance().AbsolutePath(path);
     return DirectoryOf(full) == directory && MemoryStore::Instance().Remove(full);
 }
 

@@ -6,6 +6,7 @@
 #include <string>
 #include <unordered_map>
 
+#include "base/path_parts.h"
 #include "base/status.h"
 #include "tsq/records.h"
 #include "tsq/step_source.h"
@@ -26,6 +27,11 @@ class MemoryStore {
     void RemoveDirectory(const std::string& directory);
     /// True when files directly in the path's directory live in memory. The path is absolute.
     bool Covers(const std::string& path);
+    /// The absolute path of a data file. One in memory is known by its text alone, without asking
+    /// the disk for links on its way.
+    std::string AbsolutePath(const std::string& path) {
+        return Covers(path) ? path : FullPath(path);
+    }
 
     Status Put(const std::string& path, TsqContent content);
     Status Put(const std::string& path, File file);

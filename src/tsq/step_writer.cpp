@@ -22,7 +22,7 @@ Status StepWriter::Create(const std::string& path, const TsqHeader& header,
         return status;
     auto made = std::make_unique<StepWriter>();
     // The current directory may be another one by the time the file is closed.
-    made->path = FullPath(path);
+    made->path = MemoryStore::Instance().AbsolutePath(path);
     made->isInMemory = MemoryStore::Instance().Covers(made->path);
     if (!made->isInMemory)
         if (Status status = made->target.Open(made->path); !status)

@@ -18,6 +18,9 @@ class EngineLogWatch {
     std::filesystem::file_time_type start;
 };
 
+/// The last error that a log tells, without its mark; empty where it tells none.
+std::string LastErrorIn(const std::string& path);
+
 /// The last lines of the engine's log, on standard error, or that there is none of this run.
 void ShowEngineLog(const std::string& path, bool isOfThisRun, Console& console);
 

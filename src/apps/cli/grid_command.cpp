@@ -1,16 +1,22 @@
 #include "apps/cli/grid_command.h"
 
+#include <algorithm>
 #include <array>
+#include <malloc.h>
 #include <memory>
 #include <optional>
 #include <ostream>
+#include <string>
+#include <vector>
 
 #include "apps/cli/case_file.h"
 #include "apps/cli/command_options.h"
 #include "apps/cli/engine_log.h"
 #include "apps/cli/grid_progress.h"
+#include "apps/cli/nearest_names.h"
 #include "apps/cli/size_text.h"
 #include "base/stop_signals.h"
+#include "run/grid_parts.h"
 #include "strings/catalogue.h"
 
 namespace ryn::cli {
@@ -53,6 +59,10 @@ int ShowEnd(const GridBatchOutcome& outcome, bool hasLog, const CaseFile& file, 
         return Report(console,
                       Status::InputFault(FormatText(kTextCliGridNotWanted, file.ShownName())));
     case BatchEnd::NothingGood:
+        ShowError(console, outcome.counts.active == 0
+                               ? std::string(Text(kTextCliGridAllMissing))
+                               : FormatText(kTextCliGridLastPoint,
+                                            hasLog ? LastErrorIn(outcome.logFile) : ""));
         return kExitAnalysis;
     case BatchEnd::SetUpFailed:
         ShowEngineLog(outcome.logFile, hasLog, console);
@@ -66,26 +76,108 @@ int ShowEnd(const GridBatchOutcome& outcome, bool hasLog, const CaseFile& file, 
     return Report(console, outcome.reason);
 }
 
-int RunBatch(const GridOptions& options, CaseFile& file, Console& console) {
-    GridProgress progress(console);
+/// Each point takes and frees some megabytes; handing them back to the system, which has to clear
+/// them for the next point, would cost a sixth of the whole run.
+void KeepFreedMemory() {
+    constexpr int kKept = 256 << 20;
+    ::mallopt(M_MMAP_THRESHOLD, kKept / 4);
+    ::mallopt(M_TRIM_THRESHOLD, kKept);
+}
+
+GridBatchOptions BatchOptionsOf(const GridOptions& options, GridProgress& progress,
+                                Console& console) {
     GridBatchOptions batch;
     batch.scratch = options.scratch;
     batch.memory = options.memory;
     batch.progress = &progress;
-    batch.print = [&](const std::string& line) {
+    batch.print = [&progress, &console](const std::string& line) {
         progress.Clear();
         console.out << line << std::flush;
     };
     batch.isStopped = [] { return StopSignals::Caught() != 0; };
+    return batch;
+}
+
+int RunWhole(const GridOptions& options, CaseFile& file, Console& console) {
+    GridProgress progress(console);
     const EngineLogWatch watch;
-    const GridBatchOutcome outcome = RunGridAnalysis(file.Document(), batch);
+    const GridBatchOutcome outcome =
+        RunGridAnalysis(file.Document(), BatchOptionsOf(options, progress, console));
     progress.Clear();
     return ShowEnd(outcome, watch.HasSeen(outcome.logFile), file, console);
+}
+
+int RunShare(const GridOptions& options, const GridPart& part, CaseFile& file, Console& console) {
+    GridProgress progress(console);
+    const EngineLogWatch watch;
+    const GridBatchOutcome outcome =
+        RunGridPart(file.Document(), BatchOptionsOf(options, progress, console), part);
+    progress.Clear();
+    if (outcome.end == BatchEnd::Written)
+        return kExitDone; // the merge tells what was found
+    return ShowEnd(outcome, watch.HasSeen(outcome.logFile), file, console);
+}
+
+/// A few names of many.
+std::string SomeOf(const std::vector<std::string>& names) {
+    constexpr std::size_t kMost = 20;
+    const std::size_t shown = std::min(names.size(), kMost);
+    std::string text =
+        JoinNames({names.begin(), names.begin() + static_cast<std::ptrdiff_t>(shown)});
+    return shown < names.size() ? text + ", ..." : text;
+}
+
+int FinishMerge(GridMerge& merge, CaseFile& file, Console& console) {
+    using State = GridMerge::TileState;
+    const EngineLogWatch watch;
+    if (const auto unfit = merge.TilesIn(State::Unfit); !unfit.empty())
+        return Report(console,
+                      Status::InputFault(FormatText(kTextCliGridTilesUnfit, SomeOf(unfit))));
+    if (const auto missing = merge.TilesIn(State::Missing); !missing.empty())
+        return Report(console, Status::SystemFault(FormatText(kTextCliGridTilesMissing,
+                                                              missing.size(), SomeOf(missing))));
+    const GridBatchOutcome outcome = merge.Finish();
+    return ShowEnd(outcome, watch.HasSeen(outcome.logFile), file, console);
+}
+
+int RunMerge(const GridOptions& options, int parts, CaseFile& file, Console& console) {
+    GridProgress progress(console);
+    GridBatchOptions batch = BatchOptionsOf(options, progress, console);
+    batch.print = {}; // the lines tell how far a computation has come
+    GridMerge merge(file.Document(), batch, parts);
+    if (!merge.Prepare())
+        return ShowEnd(merge.Outcome(), false, file, console);
+    merge.TakeTiles();
+    progress.Clear();
+    return FinishMerge(merge, file, console);
+}
+
+int RunAsAsked(const GridOptions& options, CaseFile& file, Console& console) {
+    KeepFreedMemory();
+    if (!options.parts)
+        return RunWhole(options, file, console);
+    if (options.merge)
+        return RunMerge(options, *options.parts, file, console);
+    return RunShare(options, {options.part.value_or(1), *options.parts}, file, console);
+}
+
+/// Options that need each other, or exclude each other.
+Status TestOptions(const GridOptions& options) {
+    const int parts = options.parts.value_or(0);
+    if (!options.parts && (options.part || options.merge))
+        return Status::InputFault(std::string(Text(kTextCliGridPartsMissing)));
+    if (options.part && options.merge)
+        return Status::InputFault(std::string(Text(kTextCliGridPartOrMerge)));
+    if (options.part && *options.part > parts)
+        return Status::InputFault(FormatText(kTextCliGridPartOutside, *options.part, parts));
+    return Status::Ok();
 }
 
 } // namespace
 
 int RunGrid(const GridOptions& options, Console& console) {
+    if (const int refused = Report(console, TestOptions(options)))
+        return refused;
     int exitCode = kExitDone;
     {
         // In memory a batch leaves nothing behind that a signal would have to wait for.
@@ -97,7 +189,7 @@ int RunGrid(const GridOptions& options, Console& console) {
             return refused;
         if (const int refused = Report(console, TestSettings(file)))
             return refused;
-        exitCode = RunBatch(options, file, console);
+        exitCode = RunAsAsked(options, file, console);
     }
     if (const int signal = StopSignals::Caught(); signal != 0 && options.scratch == Scratch::Disk)
         EndBySignal(signal);
@@ -115,6 +207,9 @@ void AddGridCommand(CommandLine& line) {
                     {kScratch, ChoiceNumbers::NotTaken}, [options](int choice) {
                         options->scratch = choice == 0 ? Scratch::Disk : Scratch::Memory;
                     });
+    AddIntOption(command, {"--parts", "N", kTextCliHelpParts}, 1, &options->parts);
+    AddIntOption(command, {"--part", "I", kTextCliHelpPart}, 1, &options->part);
+    command.add_flag("--merge", options->merge, std::string(Text(kTextCliHelpMerge)));
     AddSizeOption(command, {"--memory", "SIZE", kTextCliHelpMemory}, &options->memory);
 }
 

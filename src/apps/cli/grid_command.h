@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <optional>
 #include <string>
 
 #include "apps/cli/command_line.h"
@@ -15,7 +16,10 @@ namespace ryn::cli {
 struct GridOptions {
     std::string file;
     Scratch scratch = Scratch::Memory;
-    std::size_t memory = 0; ///< bytes; 0 for a quarter of what the process may use
+    std::size_t memory = 0;   ///< bytes; 0 for a quarter of what the process may use
+    std::optional<int> parts; ///< shares that the points are cut into
+    std::optional<int> part;  ///< the share to run, from 1
+    bool merge = false;       ///< makes the output of what the shares left
 };
 
 int RunGrid(const GridOptions& options, Console& console);

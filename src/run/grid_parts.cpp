@@ -1,0 +1,214 @@
+#include "run/grid_parts.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <system_error>
+#include <utility>
+
+#include "base/file_access.h"
+#include "base/path_parts.h"
+#include "strings/catalogue.h"
+
+namespace ryn {
+
+namespace {
+
+/// A share has several tiles, so that one which is killed has not lost all.
+constexpr int kTilesOfAPart = 8;
+
+std::string TileDirectory(const GridPlan& plan) {
+    return plan.outputFile + ".tiles";
+}
+
+std::string TileName(const GridPlan& plan, std::size_t tile, std::size_t count) {
+    return TileDirectory(plan) + "/" + std::to_string(tile + 1) + "of" + std::to_string(count);
+}
+
+/// The tiles of the whole grid: the same for every share, wherever and with however much memory it
+/// runs.
+bool PlanResultTiles(BatchRun& run, int parts, std::vector<GridTile>* tiles) {
+    // A tile is a text of some 16 bytes a number, and must stay far below what a text may hold.
+    constexpr double kMostBytes = 64.0 * 1024 * 1024;
+    const double bytes = 16.0 * static_cast<double>(run.Layout().Items()) * run.Plan().Points();
+    const auto pieces = std::max<std::int64_t>(std::int64_t{kTilesOfAPart} * parts,
+                                               static_cast<std::int64_t>(bytes / kMostBytes) + 1);
+    Status divided = run.Series().Divide(
+        static_cast<int>(std::min<std::int64_t>(pieces, run.Plan().Points())), tiles);
+    return divided ? true : run.Fail(std::move(divided));
+}
+
+std::string FingerprintOf(BatchRun& run, const CRynEditDoc& document) {
+    return BatchFingerprint(run.Root(), run.Plan(), SplitPath(document.GetPathName()).directory);
+}
+
+/// One share of a batch.
+class PartRun {
+  public:
+    PartRun(CRynEditDoc& document, const GridBatchOptions& wanted, const GridPart& share)
+        : options(WithoutLines(wanted)),
+          print(wanted.print),
+          run(document, options, BatchShare::Part),
+          part(share),
+          owner(document) {}
+
+    GridBatchOutcome Execute();
+
+  private:
+    /// The lines of the computation count points over the whole grid.
+    static GridBatchOptions WithoutLines(GridBatchOptions wanted) {
+        wanted.print = {};
+        return wanted;
+    }
+    bool MakeDirectory();
+    bool RunTile(std::size_t index);
+    void Print(int text, std::size_t index);
+
+    GridBatchOptions options;
+    PrintLine print;
+    BatchRun run;
+    GridPart part;
+    CRynEditDoc& owner;
+    std::string fingerprint;
+    std::vector<GridTile> tiles;
+};
+
+void PartRun::Print(int text, std::size_t index) {
+    if (print)
+        print(FormatText(text, index + 1, tiles.size()));
+}
+
+bool PartRun::MakeDirectory() {
+    std::error_code error;
+    std::filesystem::create_directory(TileDirectory(run.Plan()), error);
+    return error ? run.Fail(Status::FromErrno(TileDirectory(run.Plan()), error.value())) : true;
+}
+
+bool PartRun::RunTile(std::size_t index) {
+    const std::string name = TileName(run.Plan(), index, tiles.size());
+    ResultTile tile;
+    const auto items = static_cast<std::size_t>(run.Layout().Items());
+    if (ReadResultTile(name, fingerprint, items, &tile)) {
+        Print(kTextGridTileStands, index);
+        return true;
+    }
+    tile.fingerprint = fingerprint;
+    const BatchCounts before = run.Outcome().counts;
+    const auto take = [&](int point, const std::vector<float>& results) {
+        tile.points.push_back({point, true, results});
+    };
+    if (!run.RunPart(tiles[index], take))
+        return false;
+    // Those that failed have left no results.
+    for (const int point : run.PointsOf(tiles[index]))
+        if (run.States()[static_cast<std::size_t>(point)] == PointState::Failed)
+            tile.points.push_back({point, false, {}});
+    const BatchCounts& after = run.Outcome().counts;
+    tile.withMissing = after.withMissing - before.withMissing;
+    tile.withFewerPeaks = after.withFewerPeaks - before.withFewerPeaks;
+    tile.withMissingYears = after.withMissingYears - before.withMissingYears;
+    if (Status written = WriteResultTile(tile, name); !written)
+        return run.Fail(std::move(written));
+    Print(kTextGridTileWritten, index);
+    return true;
+}
+
+GridBatchOutcome PartRun::Execute() {
+    if (!run.Prepare())
+        return std::move(run.Outcome());
+    fingerprint = FingerprintOf(run, owner);
+    if (!PlanResultTiles(run, part.count, &tiles))
+        return std::move(run.Outcome());
+    run.ExpectResultsOf(run.Plan().Points() / static_cast<int>(tiles.size()) + 1);
+    if (!MakeDirectory() || !run.ReadActivity())
+        return std::move(run.Outcome());
+    const auto count = static_cast<std::size_t>(part.count);
+    const std::size_t first = tiles.size() * static_cast<std::size_t>(part.number - 1) / count;
+    const std::size_t end = tiles.size() * static_cast<std::size_t>(part.number) / count;
+    for (std::size_t i = first; i < end; ++i)
+        if (!RunTile(i))
+            return std::move(run.Outcome());
+    run.Outcome().end = BatchEnd::Written;
+    return std::move(run.Outcome());
+}
+
+} // namespace
+
+GridBatchOutcome RunGridPart(CRynEditDoc& document, const GridBatchOptions& options,
+                             const GridPart& part) {
+    return PartRun(document, options, part).Execute();
+}
+
+GridMerge::GridMerge(CRynEditDoc& analysed, const GridBatchOptions& wanted, int partCount)
+    : options(wanted),
+      document(analysed),
+      run(analysed, options),
+      parts(partCount) {}
+
+bool GridMerge::Prepare() {
+    if (!run.Prepare() || !PlanResultTiles(run, parts, &tiles))
+        return false;
+    // Before the sections point at a point.
+    fingerprint = FingerprintOf(run, document);
+    if (!run.ReadActivity())
+        return false;
+    states.assign(tiles.size(), TileState::Missing);
+    if (options.print)
+        run.PrintCreatedLines();
+    grids.emplace(run.Layout(), run.Plan().CellsX(), run.Plan().CellsY(),
+                  run.Series().Header().DeleteValue());
+    return true;
+}
+
+void GridMerge::TakeTiles() {
+    const auto items = static_cast<std::size_t>(run.Layout().Items());
+    for (std::size_t i = 0; i < tiles.size(); ++i) {
+        const std::string name = TileName(run.Plan(), i, tiles.size());
+        if (states[i] == TileState::Taken || !CanOpenForReading(name))
+            continue;
+        ResultTile tile;
+        const bool fits = ReadResultTile(name, fingerprint, items, &tile) && TakeTile(i, tile);
+        states[i] = fits ? TileState::Taken : TileState::Unfit;
+    }
+}
+
+/// False for a tile that does not hold just the tile's active points.
+bool GridMerge::TakeTile(std::size_t index, const ResultTile& tile) {
+    std::vector<int> expected = run.PointsOf(tiles[index]);
+    std::vector<int> found;
+    for (const ResultTile::Point& point : tile.points)
+        found.push_back(point.number);
+    std::sort(expected.begin(), expected.end());
+    std::sort(found.begin(), found.end());
+    if (found != expected)
+        return false;
+    for (const ResultTile::Point& point : tile.points) {
+        const GridPoint cell = run.OffsetsOf(point.number);
+        grids->CopyRow(point.results, cell.x, cell.y);
+        run.NotePoint(point.number, point.isGood ? PointState::Good : PointState::Failed);
+    }
+    BatchCounts& counts = run.Outcome().counts;
+    counts.withMissing += tile.withMissing;
+    counts.withFewerPeaks += tile.withFewerPeaks;
+    counts.withMissingYears += tile.withMissingYears;
+    return true;
+}
+
+std::vector<std::string> GridMerge::TilesIn(TileState state) const {
+    std::vector<std::string> names;
+    for (std::size_t i = 0; i < tiles.size(); ++i)
+        if (states[i] == state)
+            names.push_back(TileName(run.Plan(), i, tiles.size()));
+    return names;
+}
+
+GridBatchOutcome GridMerge::Finish() {
+    if (run.LeaveLastFiles() && run.WriteOutput(*grids)) {
+        std::error_code error; // what cannot be removed does no harm
+        for (std::size_t i = 0; i < tiles.size(); ++i)
+            std::filesystem::remove(TileName(run.Plan(), i, tiles.size()), error);
+        std::filesystem::remove(TileDirectory(run.Plan()), error);
+    }
+    return std::move(run.Outcome());
+}
+
+} // namespace ryn
