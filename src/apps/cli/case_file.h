@@ -26,6 +26,8 @@ class CaseFile {
 
     CGlobalKvf& Root() { return document.GetGlobalKvf(); }
     CRynEditDoc& Document() { return document; }
+    /// The absolute name, in the spelling that is read or written.
+    const std::string& Path() const { return path; }
     /// The name as the user gave it, in the spelling that is read or written.
     const std::string& ShownName() const { return shownName; }
 

@@ -13,11 +13,15 @@
 #include "apps/cli/command_options.h"
 #include "apps/cli/engine_log.h"
 #include "apps/cli/grid_progress.h"
+#include "apps/cli/launcher.h"
 #include "apps/cli/nearest_names.h"
+#include "apps/cli/part_jobs.h"
 #include "apps/cli/size_text.h"
+#include "base/process_limits.h"
 #include "base/stop_signals.h"
 #include "run/grid_parts.h"
 #include "strings/catalogue.h"
+#include "strings/language.h"
 
 namespace ryn::cli {
 
@@ -152,18 +156,72 @@ int RunMerge(const GridOptions& options, int parts, CaseFile& file, Console& con
     return FinishMerge(merge, file, console);
 }
 
+/// The arguments with which a part is started; the case is named absolute, since opening it has
+/// moved the current directory.
+std::vector<std::string> ArgumentsOfPart(const GridOptions& options, const CaseFile& file,
+                                         int part) {
+    const int parts = *options.jobs;
+    const std::size_t memory = options.memory != 0 ? options.memory : UsableMemory() / 4;
+    return {"grid",      file.Path(),
+            "--parts",   std::to_string(parts),
+            "--part",    std::to_string(part),
+            "--scratch", options.scratch == Scratch::Disk ? "disk" : "memory",
+            "--memory",  std::to_string(memory / static_cast<std::size_t>(parts)),
+            "--lang",    CurrentLanguage() == Language::Japanese ? "ja" : "en"};
+}
+
+int RunJobs(const GridOptions& options, CaseFile& file, Console& console) {
+    GridProgress progress(console);
+    GridMerge merge(file.Document(), BatchOptionsOf(options, progress, console), *options.jobs);
+    if (!merge.Prepare())
+        return ShowEnd(merge.Outcome(), false, file, console);
+    PartJobs jobs;
+    jobs.program = "/proc/self/exe";
+    jobs.parts = *options.jobs;
+    jobs.argumentsOf = [&](int part) { return ArgumentsOfPart(options, file, part); };
+    jobs.noteProgress = [&merge] { merge.TakeTiles(); };
+    jobs.isStopped = [] { return StopSignals::Caught() != 0; };
+    const PartJobsEnd end = RunPartJobs(jobs);
+    progress.Clear();
+    if (end.wasStopped)
+        return kExitSystem;
+    if (end.part != 0) {
+        ShowError(console, FormatText(kTextCliGridPartFailed, end.part, *options.jobs));
+        console.err << end.errors;
+        return end.exitCode;
+    }
+    merge.TakeTiles();
+    progress.Clear();
+    return FinishMerge(merge, file, console);
+}
+
 int RunAsAsked(const GridOptions& options, CaseFile& file, Console& console) {
     KeepFreedMemory();
+    if (options.jobs)
+        return RunJobs(options, file, console);
     if (!options.parts)
         return RunWhole(options, file, console);
     if (options.merge)
         return RunMerge(options, *options.parts, file, console);
-    return RunShare(options, {options.part.value_or(1), *options.parts}, file, console);
+    GridPart part{options.part.value_or(0), *options.parts};
+    if (!options.part)
+        if (const int refused =
+                Report(console, PartOfLauncher(ProcessEnvironment(), part.count, &part.number)))
+            return refused;
+    return RunShare(options, part, file, console);
+}
+
+/// Where a signal has to wait until what the batch leaves elsewhere is gone: files on disk, or
+/// processes of its own. In memory there is nothing of that kind.
+bool NeedsOrderlyEnd(const GridOptions& options) {
+    return options.scratch == Scratch::Disk || options.jobs.has_value();
 }
 
 /// Options that need each other, or exclude each other.
 Status TestOptions(const GridOptions& options) {
     const int parts = options.parts.value_or(0);
+    if (options.jobs && (options.parts || options.part || options.merge))
+        return Status::InputFault(std::string(Text(kTextCliGridJobsAlone)));
     if (!options.parts && (options.part || options.merge))
         return Status::InputFault(std::string(Text(kTextCliGridPartsMissing)));
     if (options.part && options.merge)
@@ -180,9 +238,8 @@ int RunGrid(const GridOptions& options, Console& console) {
         return refused;
     int exitCode = kExitDone;
     {
-        // In memory a batch leaves nothing behind that a signal would have to wait for.
         std::optional<StopSignals> signals;
-        if (options.scratch == Scratch::Disk)
+        if (NeedsOrderlyEnd(options))
             signals.emplace();
         CaseFile file(console, Consent::Given);
         if (const int refused = file.Open(options.file))
@@ -191,7 +248,7 @@ int RunGrid(const GridOptions& options, Console& console) {
             return refused;
         exitCode = RunAsAsked(options, file, console);
     }
-    if (const int signal = StopSignals::Caught(); signal != 0 && options.scratch == Scratch::Disk)
+    if (const int signal = StopSignals::Caught(); signal != 0 && NeedsOrderlyEnd(options))
         EndBySignal(signal);
     return exitCode;
 }
@@ -209,6 +266,7 @@ void AddGridCommand(CommandLine& line) {
                     });
     AddIntOption(command, {"--parts", "N", kTextCliHelpParts}, 1, &options->parts);
     AddIntOption(command, {"--part", "I", kTextCliHelpPart}, 1, &options->part);
+    AddIntOption(command, {"--jobs", "N", kTextCliHelpJobs}, 1, &options->jobs);
     command.add_flag("--merge", options->merge, std::string(Text(kTextCliHelpMerge)));
     AddSizeOption(command, {"--memory", "SIZE", kTextCliHelpMemory}, &options->memory);
 }

@@ -20,6 +20,7 @@ struct GridOptions {
     std::optional<int> parts; ///< shares that the points are cut into
     std::optional<int> part;  ///< the share to run, from 1
     bool merge = false;       ///< makes the output of what the shares left
+    std::optional<int> jobs;  ///< shares to run at once on this machine, then merged
 };
 
 int RunGrid(const GridOptions& options, Console& console);

@@ -5,6 +5,7 @@
 
 #include "apps/cli/command_options.h"
 #include "apps/cli/console_ports.h"
+#include "apps/cli/grid_info.h"
 #include "apps/cli/input_file.h"
 #include "apps/cli/kvf_json.h"
 #include "apps/cli/kvf_listing.h"
@@ -18,19 +19,46 @@ namespace ryn::cli {
 
 namespace {
 
-int ShowSeries(const std::string& path, OutputForm form, Console& console) {
-    SeriesInfo info;
-    ProgressLine progress(console);
-    const Status read = ReadSeriesInfo(path, progress, &info);
-    progress.Clear();
-    if (!read)
-        return Report(console, read);
-    if (form == OutputForm::Json)
+void ShowSeries(const SeriesInfo& info, const InfoOptions& options, const std::string& path,
+                Console& console) {
+    if (options.form == OutputForm::Json)
         PrintJson(console, JsonOfSeries(info));
     else
         PrintSeries(console.out, info, path);
     if (info.backwardSteps > 0)
         ShowWarning(console, FormatText(kTextCliBackwardSteps, path, info.backwardSteps));
+}
+
+void ShowGrid(const GridInfo& info, const InfoOptions& options, const std::string& path,
+              Console& console) {
+    if (options.form == OutputForm::Json)
+        PrintJson(console, JsonOfGrid(info));
+    else
+        PrintGrid(console.out, info, path);
+    for (const std::string& note : info.grid.notes)
+        ShowNote(console, note);
+}
+
+/// A grid where the file holds one; else its series.
+int ShowData(const std::string& path, const InfoOptions& options, Console& console) {
+    ProgressLine progress(console);
+    GridInfo grid;
+    const Status noGrid = ReadGridInfo(path, progress, &grid);
+    progress.Clear();
+    if (noGrid) {
+        ShowGrid(grid, options, path, console);
+        return kExitDone;
+    }
+    SeriesInfo series;
+    const Status noSeries = ReadSeriesInfo(path, progress, &series);
+    progress.Clear();
+    if (!noSeries) {
+        // Whoever has a grid in mind learns why it is none, too.
+        const int code = Report(console, noSeries);
+        ShowNote(console, noGrid.Text());
+        return code;
+    }
+    ShowSeries(series, options, path, console);
     return kExitDone;
 }
 
@@ -56,7 +84,7 @@ int RunInfo(const InfoOptions& options, Console& console) {
         IsParameterFileName(options.file) ? FindParameterFile(options.file) : options.file;
     if (const int refused = Report(console, TestReadable(path)))
         return refused;
-    return KindOfFile(path) == FileKind::DataFile ? ShowSeries(path, options.form, console)
+    return KindOfFile(path) == FileKind::DataFile ? ShowData(path, options, console)
                                                   : ShowTree(path, options.form, console);
 }
 

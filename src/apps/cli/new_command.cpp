@@ -17,6 +17,9 @@ int RunNew(const NewOptions& options, Console& console) {
     if (const int refused =
             Report(console, ApplyArguments(file.Root(), options.arguments, callerDirectory)))
         return refused;
+    if (const int refused = Report(
+            console, ApplyGridArguments(options.grid, callerDirectory, file.Root().GridInput())))
+        return refused;
     return file.Save();
 }
 
@@ -27,6 +30,12 @@ void AddNewCommand(CommandLine& line) {
                                   }});
     AddCaseFileArgument(command, &options->file);
     AddCaseArguments(command, &options->arguments);
+    AddTextOption(command, {"--grid", "FILE", kTextCliHelpGridFile}, &options->grid.grid);
+    AddIntOption(command, {"--grid-item", "N", kTextCliHelpGridItem}, 1, &options->grid.item);
+    AddTextOption(command, {"--x", "A:B:S", kTextCliHelpGridX}, &options->grid.x);
+    AddTextOption(command, {"--y", "A:B:S", kTextCliHelpGridY}, &options->grid.y);
+    AddTextOption(command, {"--time", "A:B", kTextCliHelpGridTime}, &options->grid.time);
+    AddTextOption(command, {"--grid-out", "FILE", kTextCliHelpGridOutput}, &options->grid.output);
     AddConsentOption(command, &options->consent);
 }
 

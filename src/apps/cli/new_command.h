@@ -5,6 +5,7 @@
 #include "apps/cli/case_arguments.h"
 #include "apps/cli/command_line.h"
 #include "apps/cli/console.h"
+#include "apps/cli/grid_arguments.h"
 
 namespace ryn::cli {
 
@@ -12,6 +13,7 @@ namespace ryn::cli {
 struct NewOptions {
     std::string file; ///< named .ryn or .RYN; saved as .RYN
     CaseArguments arguments;
+    GridArguments grid;
     Consent consent = Consent::NotGiven;
 };
 

@@ -1,0 +1,45 @@
+#pragma once
+
+#include <functional>
+#include <string>
+#include <sys/types.h>
+#include <vector>
+
+#include "base/status.h"
+
+namespace ryn::cli {
+
+/// A child process whose standard output and standard error are read through pipes. It is stopped
+/// (SIGTERM) when its parent dies, and when the object goes while it runs.
+class ChildProcess {
+  public:
+    ChildProcess() = default;
+    ~ChildProcess();
+    ChildProcess(ChildProcess&& other) noexcept;
+    ChildProcess& operator=(ChildProcess&& other) noexcept;
+
+    /// `arguments` without the program's name.
+    Status Start(const std::string& program, const std::vector<std::string>& arguments);
+
+    bool IsRunning() const { return pid > 0; }
+    int Output() const { return output; }
+    int Errors() const { return errors; }
+    /// Reads what there is at Output() or Errors() without waiting and appends it; false at its
+    /// end.
+    bool ReadOutput(std::string* text) { return Read(&output, text); }
+    bool ReadErrors(std::string* text) { return Read(&errors, text); }
+    void Stop() const;
+    /// Waits for the end, which IsRunning no longer is after: the exit code, or 128 and the signal
+    /// that ended it.
+    int Wait();
+
+  private:
+    static bool Read(int* descriptor, std::string* text);
+    void Close();
+
+    pid_t pid = -1;
+    int output = -1; // read ends; -1 at their end
+    int errors = -1;
+};
+
+} // namespace ryn::cli

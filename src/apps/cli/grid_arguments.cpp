@@ -1,0 +1,113 @@
+#include "apps/cli/grid_arguments.h"
+
+#include <string_view>
+#include <vector>
+
+#include "base/file_access.h"
+#include "base/number_text.h"
+#include "base/path_parts.h"
+#include "grid/grid_edit.h"
+#include "strings/catalogue.h"
+
+namespace ryn::cli {
+
+namespace {
+
+/// A range option: its name, whether it has a step, and how many places its axis has.
+struct RangeOption {
+    const char* name;
+    const std::optional<std::string>& text;
+    bool hasStep;
+    int size;
+};
+
+Status BadRange(const RangeOption& option) {
+    return Status::InputFault(FormatText(
+        kTextCliBadValue, std::string(option.name), option.text.value_or(""),
+        FormatText(option.hasStep ? kTextCliExpectRange : kTextCliExpectSteps, option.size - 1)));
+}
+
+/// The numbers between colons; nothing where one is none.
+std::optional<std::vector<int>> NumbersIn(std::string_view text) {
+    std::vector<int> numbers;
+    for (;;) {
+        const std::size_t colon = text.find(':');
+        const std::optional<int> number = ParseInt(text.substr(0, colon));
+        if (!number)
+            return std::nullopt;
+        numbers.push_back(*number);
+        if (colon == std::string_view::npos)
+            return numbers;
+        text.remove_prefix(colon + 1);
+    }
+}
+
+Status TakeRange(const RangeOption& option, IndexRange* range) {
+    *range = {0, option.size - 1, 1};
+    if (!option.text)
+        return Status::Ok();
+    const std::optional<std::vector<int>> numbers = NumbersIn(*option.text);
+    const std::size_t most = option.hasStep ? 3 : 2;
+    if (!numbers || numbers->size() < 2 || numbers->size() > most)
+        return BadRange(option);
+    range->first = numbers->at(0);
+    range->last = numbers->at(1);
+    if (numbers->size() == 3)
+        range->step = numbers->at(2);
+    const bool isInside = range->first >= 0 && range->first <= range->last &&
+                          range->last < option.size && range->step >= 1;
+    return isInside ? Status::Ok() : BadRange(option);
+}
+
+Status Needs(const char* option, const char* other) {
+    return Status::InputFault(FormatText(kTextCliOptionNeeds, option, other));
+}
+
+Status TestTogether(const GridArguments& arguments) {
+    if (!arguments.grid) {
+        if (arguments.item || arguments.x || arguments.y || arguments.time || arguments.output)
+            return Needs(arguments.item   ? "--grid-item"
+                         : arguments.x    ? "--x"
+                         : arguments.y    ? "--y"
+                         : arguments.time ? "--time"
+                                          : "--grid-out",
+                         "--grid");
+        return Status::Ok();
+    }
+    if (!arguments.item)
+        return Needs("--grid", "--grid-item");
+    return arguments.output ? Status::Ok() : Needs("--grid", "--grid-out");
+}
+
+} // namespace
+
+Status ApplyGridArguments(const GridArguments& arguments, const std::string& callerDirectory,
+                          CTsq2InputKvf& input) {
+    if (Status fault = TestTogether(arguments); !fault || !arguments.grid)
+        return fault;
+    const std::string grid = FullPath(*arguments.grid, callerDirectory);
+    const std::string output = FullPath(*arguments.output, callerDirectory);
+    if (grid == output || IsSameFile(grid, output))
+        return Status::InputFault(FormatText(kTextCliOverInput, *arguments.output));
+    CGridEditEngine engine;
+    if (engine.OpenFile(grid, true) != kGridOk)
+        return engine.LastError();
+    const CGridEditHeaderInfo header = engine.QueryHeaderInfo();
+    if (*arguments.item > header.Items())
+        return Status::InputFault(
+            "--grid-item: " + FormatText(kTextGridItemMissing, *arguments.item, header.Items()));
+    Status taken =
+        TakeRange({"--x", arguments.x, true, header.SizeX()}, &input.X_Range_And_Interval);
+    if (taken)
+        taken = TakeRange({"--y", arguments.y, true, header.SizeY()}, &input.Y_Range_And_Interval);
+    if (taken)
+        taken = TakeRange({"--time", arguments.time, false, header.TimeStepPast()},
+                          &input.Time_Range_And_Interval);
+    input.UseTsq2Input = true;
+    input.Tsq2InputFile = grid;
+    input.Tsq2OutputFile = output;
+    input.Tsq2ItemNo = *arguments.item;
+    return taken;
+}
+
+} // namespace ryn::cli

@@ -1,0 +1,111 @@
+#include "apps/cli/part_jobs.h"
+
+#include <algorithm>
+#include <poll.h>
+
+#include "apps/cli/child_process.h"
+#include "apps/cli/exit_code.h"
+
+namespace ryn::cli {
+
+namespace {
+
+/// One part's process and what is known of it.
+struct Job {
+    int part = 0;
+    int starts = 0;
+    ChildProcess process;
+    std::string errors;
+};
+
+/// All parts, from the first start to the last end.
+class Supervisor {
+  public:
+    explicit Supervisor(const PartJobs& wanted) : jobs(wanted) {}
+
+    PartJobsEnd Run() {
+        for (int part = 1; part <= jobs.parts && end.part == 0; ++part) {
+            running.emplace_back();
+            running.back().part = part;
+            Start(running.back());
+        }
+        while (!running.empty()) {
+            if (!end.wasStopped && end.part == 0 && jobs.isStopped && jobs.isStopped()) {
+                end.wasStopped = true;
+                StopAll();
+            }
+            Await();
+            for (Job& job : running)
+                Read(job);
+            std::erase_if(running, [](const Job& job) { return !job.process.IsRunning(); });
+        }
+        return std::move(end);
+    }
+
+  private:
+    void Start(Job& job) {
+        ++job.starts;
+        job.errors.clear();
+        const Status started = job.process.Start(jobs.program, jobs.argumentsOf(job.part));
+        if (!started)
+            Fail(job, kExitSystem, started.Text());
+    }
+
+    void Fail(const Job& job, int exitCode, const std::string& errors) {
+        if (end.part != 0 || end.wasStopped)
+            return; // the first failure is the reason of the others
+        end.part = job.part;
+        end.exitCode = exitCode;
+        end.errors = errors;
+        StopAll();
+    }
+
+    void StopAll() {
+        for (const Job& job : running)
+            job.process.Stop();
+    }
+
+    /// Until a part writes or ends, or it is time to ask whether to stop.
+    void Await() {
+        constexpr int kMilliseconds = 100;
+        std::vector<pollfd> watched;
+        for (const Job& job : running)
+            for (const int descriptor : {job.process.Output(), job.process.Errors()})
+                if (descriptor >= 0)
+                    watched.push_back({descriptor, POLLIN, 0});
+        ::poll(watched.data(), watched.size(), kMilliseconds);
+    }
+
+    void Read(Job& job) {
+        std::string text;
+        const bool writes = job.process.ReadOutput(&text);
+        const bool complains = job.process.ReadErrors(&job.errors);
+        if (!text.empty() && jobs.noteProgress)
+            jobs.noteProgress();
+        constexpr std::size_t kKept = 16384;
+        if (job.errors.size() > kKept)
+            job.errors.erase(0, job.errors.size() - kKept);
+        if (writes || complains || !job.process.IsRunning())
+            return;
+        const int exitCode = job.process.Wait();
+        if (exitCode == kExitDone)
+            return;
+        const bool died = exitCode == kExitSystem || exitCode >= 127;
+        if (died && job.starts < 2 && end.part == 0 && !end.wasStopped)
+            Start(job);
+        else
+            Fail(job, died ? kExitSystem : exitCode, job.errors);
+    }
+
+    const PartJobs& jobs;
+    std::vector<Job> running;
+    PartJobsEnd end;
+};
+
+} // namespace
+
+PartJobsEnd RunPartJobs(const PartJobs& jobs) {
+    return Supervisor(jobs).Run();
+}
+
+} // namespace ryn::cli
