@@ -5,7 +5,7 @@ fitted distributions, and quantiles at five return periods, written to a netCDF 
 usage: grid_rivals.py scipy|xarray|slices GRID OUTPUT
 
 scipy   annual maxima with xarray, then a loop over scipy.stats.genextreme.fit (maximum likelihood)
-        at SAMPLE points that lie evenly over the grid; the time of the loop is scaled up to all points
+        at SAMPLE points that lie evenly over the grid, its time scaled up to all points
 xarray  annual maxima with xarray, then L-moment fits of GEV and Gumbel for all points at once
 slices  the same, but annual maxima year by year with netCDF4 and NumPy
 

@@ -1,7 +1,8 @@
 """Rows of the grid batch, against SciPy, xarray and NumPy and against itself: other sizes, two
 processes. Its grids, some 2 GB, are made once and kept in build/bench-data beneath the repository.
 
-One-core rows are processor time of processes that may use one core. All files lie in the page cache.
+One-core rows are processor time of processes that may use one core. All files lie in the page
+cache. The row of wall time needs a machine that does nothing else.
 """
 import dataclasses
 import json
@@ -84,8 +85,8 @@ def run_rival(name, grid):
 
 
 def repeated(runs):
-    """Name -> what each repetition of that run has spent; the runs take turns, after one that brings
-    the files into the cache."""
+    """Name -> what each repetition of that run has spent; the runs take turns, after one that
+    brings the files into the cache."""
     spent = {name: [] for name in runs}
     for name, work in runs.items():
         work()
@@ -119,7 +120,8 @@ def check_same_answers(batch):
 
 def add_rivals(table, batch, grid):
     runs = {"ryn": batch.on_one_core}
-    runs |= {name: lambda name=name: run_rival(name, grid) for name in ["scipy", "xarray", "slices"]}
+    runs |= {name: lambda name=name: run_rival(name, grid)
+             for name in ["scipy", "xarray", "slices"]}
     spent = repeated(runs)
     check_same_answers(batch)
     ours = processor(spent["ryn"])
@@ -137,6 +139,8 @@ def add_two_processes(table, batch):
                       "two": lambda: batch.run(LIMITED, "--jobs", "2")})
     table.add("ryn grid / ryn grid --jobs 2 with its merge, wall time",
               wall(spent["one"]) / wall(spent["two"]), at_least=1.7)
+    table.add("ryn grid --jobs 2 with its merge / ryn grid, processor time",
+              processor(spent["two"]) / processor(spent["one"]))
 
 
 def add_sizes(table, program):
