@@ -87,11 +87,15 @@ Status About(const char* option, const Status& fault) {
     return fault.Kind() == Fault::System ? Status::SystemFault(text) : Status::InputFault(text);
 }
 
+Status NoName(const char* option) {
+    return Status::InputFault(
+        FormatText(kTextCliBadValue, option, "", std::string(Text(kTextCliExpectFile))));
+}
+
 /// The results are written over nothing but a file of earlier ones.
 Status TestOutput(const std::string& output, const std::string& grid) {
     if (output.empty())
-        return Status::InputFault(FormatText(kTextCliBadValue, "--grid-out", output,
-                                             std::string(Text(kTextCliExpectFile))));
+        return NoName("--grid-out");
     if (grid == output || IsSameFile(grid, output))
         return About("--grid-out", Status::InputFault(FormatText(kTextCliOverInput, output)));
     const Status replaceable = TestReplaceable(output, Consent::Given);
@@ -118,6 +122,8 @@ Status ApplyGridArguments(const GridArguments& arguments, const std::string& cal
         return fault;
     const std::string grid = AbsoluteName(*arguments.grid, callerDirectory);
     const std::string output = AbsoluteName(*arguments.output, callerDirectory);
+    if (grid.empty())
+        return NoName("--grid");
     if (Status readable = TestReadable(grid); !readable)
         return About("--grid", readable);
     if (Status free = TestOutput(output, grid); !free)

@@ -29,21 +29,22 @@ bool HasCoordinates(const GridAxisDescription& axis) {
     return axis.first != axis.last || (axis.size == 1 && axis.isRegular);
 }
 
-std::optional<double> SpacingOf(const GridAxisDescription& axis) {
-    if (!axis.isRegular || axis.size < 2)
-        return std::nullopt;
-    return (axis.last - axis.first) / (axis.size - 1);
-}
-
-/// As a float: files have many coordinates so, and as doubles they would show their rounding.
 std::string CoordinateText(double value) {
     return ShortestText(static_cast<float>(value));
 }
 
-/// The double nearest to the float's shortest text, where the number is a float.
-Json JsonOfCoordinate(double value) {
-    const auto rounded = static_cast<float>(value);
-    return static_cast<double>(rounded) == value ? JsonOf(rounded) : JsonOf(value);
+/// A coordinate as it was meant: files have many as floats, whose rounding a double would show.
+double AsMeant(double coordinate) {
+    const auto rounded = static_cast<float>(coordinate);
+    return static_cast<double>(rounded) == coordinate ? *ParseDouble(ShortestText(rounded))
+                                                      : coordinate;
+}
+
+/// To the precision in which an analysis takes it.
+std::optional<float> SpacingOf(const GridAxisDescription& axis) {
+    if (!axis.isRegular || axis.size < 2)
+        return std::nullopt;
+    return static_cast<float>((AsMeant(axis.last) - AsMeant(axis.first)) / (axis.size - 1));
 }
 
 std::string AxisText(const GridAxisDescription& axis) {
@@ -58,8 +59,8 @@ std::string AxisText(const GridAxisDescription& axis) {
     }
     if (!axis.isRegular)
         text += ", " + TextOf(kTextCliGridIrregular);
-    else if (const std::optional<double> spacing = SpacingOf(axis))
-        text += ", " + FormatText(kTextCliGridSpacing, CoordinateText(*spacing));
+    else if (const std::optional<float> spacing = SpacingOf(axis))
+        text += ", " + FormatText(kTextCliGridSpacing, ShortestText(*spacing));
     if (axis.isTurned)
         text += ", " + TextOf(kTextCliGridTurned);
     return text;
@@ -126,13 +127,13 @@ void PrintItem(std::ostream& out, const GridItemDescription& item, const GridSum
 
 Json JsonOfAxis(const GridAxisDescription& axis) {
     const bool isPlaced = HasCoordinates(axis);
-    const std::optional<double> spacing = SpacingOf(axis);
+    const std::optional<float> spacing = SpacingOf(axis);
     return {{"name", axis.name},
             {"units", axis.units},
             {"size", axis.size},
-            {"first", isPlaced ? JsonOfCoordinate(axis.first) : Json(nullptr)},
-            {"last", isPlaced ? JsonOfCoordinate(axis.last) : Json(nullptr)},
-            {"spacing", spacing ? JsonOfCoordinate(*spacing) : Json(nullptr)},
+            {"first", isPlaced ? JsonOf(AsMeant(axis.first)) : Json(nullptr)},
+            {"last", isPlaced ? JsonOf(AsMeant(axis.last)) : Json(nullptr)},
+            {"spacing", spacing ? JsonOf(*spacing) : Json(nullptr)},
             {"turned", axis.isTurned}};
 }
 
