@@ -3,6 +3,7 @@
 #include <string_view>
 #include <vector>
 
+#include "apps/cli/input_file.h"
 #include "base/file_access.h"
 #include "base/number_text.h"
 #include "base/path_parts.h"
@@ -89,6 +90,8 @@ Status ApplyGridArguments(const GridArguments& arguments, const std::string& cal
     const std::string output = FullPath(*arguments.output, callerDirectory);
     if (grid == output || IsSameFile(grid, output))
         return Status::InputFault(FormatText(kTextCliOverInput, *arguments.output));
+    if (Status readable = TestReadable(grid); !readable)
+        return readable;
     CGridEditEngine engine;
     if (engine.OpenFile(grid, true) != kGridOk)
         return engine.LastError();

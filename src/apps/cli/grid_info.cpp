@@ -81,8 +81,7 @@ void PrintItem(std::ostream& out, const GridItemDescription& item, const GridSum
     TextTable table({Alignment::Left, Alignment::Left});
     table.AddRow({TextOf(kTextCliGridVariable), item.variable + "(" + item.storage + ")"});
     if (item.layers > 1)
-        table.AddRow(
-            {TextOf(kTextCliGridLayers), FormatText(kTextCliGridFirstLayer, item.layers)});
+        table.AddRow({TextOf(kTextCliGridLayers), FormatText(kTextCliGridFirstLayer, item.layers)});
     table.AddRow({TextOf(kTextCliMissing), FixedText(100.0 * summary.MissingShare(), 1) + " %"});
     if (summary.missing < summary.values) {
         table.AddRow({TextOf(kTextCliSmallest), ShortestText(summary.smallest)});
