@@ -7,6 +7,7 @@
 # make coverage  how often the reported deviation holds the true 100-year event (two minutes)
 # make validation  every fit against the same fit in R; rewrites its tables in docs/methods.md.
 #                  PUBLISHED=DIR adds reference_fits.csv of that directory, with its series
+# make test-cluster  the grid batch under a Slurm of its own, mpirun and GNU parallel (as root)
 # make fuzz      each fuzz target for FUZZ_SECONDS seconds (default 600)
 
 JOBS ?= $(shell nproc)
@@ -16,7 +17,7 @@ FUZZ_SECONDS ?= 600
 export CCACHE_BASEDIR := $(CURDIR)
 export CCACHE_NOHASHDIR := 1
 
-.PHONY: run test build sanitize lint bench coverage validation fuzz format packages clean
+.PHONY: run test test-cluster build sanitize lint bench coverage validation fuzz format packages clean
 .DEFAULT_GOAL := build
 
 packages:
@@ -35,6 +36,10 @@ run: build
 test: build/dev/build.ninja
 	cmake --build build/dev -j $(JOBS)
 	ctest --test-dir build/dev -j $(JOBS) --output-on-failure
+
+test-cluster: build
+	@tools/install-packages tests/cluster/packages.txt
+	PYTHONDONTWRITEBYTECODE=1 python3 tests/cluster/run.py build/release/bin
 
 sanitize: build/sanitize/build.ninja
 	cmake --build build/sanitize -j $(JOBS)

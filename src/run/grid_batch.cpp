@@ -91,9 +91,9 @@ bool GridBatch::ComputeOnDisk() {
     }
     if (!MakeSeriesOnDisk(points))
         return false;
-    std::vector<bool> active;
-    for (const CTsq0FileInfo& point : points)
-        active.push_back(point.IsActive());
+    std::vector<bool> active(points.size());
+    std::transform(points.begin(), points.end(), active.begin(),
+                   [](const CTsq0FileInfo& point) { return point.IsActive(); });
     run.SetActivity(active);
     MakeGrids();
     for (int p = 0; p < run.Plan().Points(); ++p)

@@ -33,8 +33,9 @@ constexpr int kCannotStart = 127; // what shells give
 
 ChildProcess::~ChildProcess() {
     Stop();
+    int exitCode = 0;
     if (IsRunning())
-        Wait();
+        Wait(0, &exitCode);
     Close();
 }
 
@@ -104,13 +105,21 @@ void ChildProcess::Stop() const {
         ::kill(pid, SIGTERM);
 }
 
-int ChildProcess::Wait() {
+bool ChildProcess::HasEnded(int* exitCode) {
+    return Wait(WNOHANG, exitCode);
+}
+
+bool ChildProcess::Wait(int options, int* exitCode) {
     int status = 0;
-    while (::waitpid(pid, &status, 0) < 0 && errno == EINTR)
-        continue;
+    pid_t ended = 0;
+    do
+        ended = ::waitpid(pid, &status, options);
+    while (ended < 0 && errno == EINTR);
+    if (ended == 0)
+        return false;
     pid = -1;
-    Close();
-    return WIFSIGNALED(status) ? 128 + WTERMSIG(status) : WEXITSTATUS(status);
+    *exitCode = WIFSIGNALED(status) ? 128 + WTERMSIG(status) : WEXITSTATUS(status);
+    return true;
 }
 
 void ChildProcess::Close() {

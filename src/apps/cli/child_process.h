@@ -29,13 +29,15 @@ class ChildProcess {
     bool ReadOutput(std::string* text) { return Read(&output, text); }
     bool ReadErrors(std::string* text) { return Read(&errors, text); }
     void Stop() const;
-    /// Waits for the end, which IsRunning no longer is after: the exit code, or 128 and the signal
-    /// that ended it.
-    int Wait();
+    /// Whether it has ended, after which IsRunning is false: with the exit code, or 128 and the
+    /// signal that ended it. What it wrote last can still be read.
+    bool HasEnded(int* exitCode);
 
   private:
     static bool Read(int* descriptor, std::string* text);
     void Close();
+    /// `options` as waitpid takes them.
+    bool Wait(int options, int* exitCode);
 
     pid_t pid = -1;
     int output = -1; // read ends; -1 at their end

@@ -1,11 +1,14 @@
 #include "apps/cli/grid_arguments.h"
 
+#include <array>
 #include <string_view>
+#include <utility>
 #include <vector>
 
+#include "apps/cli/input_file.h"
+#include "apps/cli/setting_value.h"
 #include "base/file_access.h"
 #include "base/number_text.h"
-#include "base/path_parts.h"
 #include "grid/grid_edit.h"
 #include "strings/catalogue.h"
 
@@ -64,19 +67,51 @@ Status Needs(const char* option, const char* other) {
 }
 
 Status TestTogether(const GridArguments& arguments) {
-    if (!arguments.grid) {
-        if (arguments.item || arguments.x || arguments.y || arguments.time || arguments.output)
-            return Needs(arguments.item   ? "--grid-item"
-                         : arguments.x    ? "--x"
-                         : arguments.y    ? "--y"
-                         : arguments.time ? "--time"
-                                          : "--grid-out",
-                         "--grid");
-        return Status::Ok();
-    }
-    if (!arguments.item)
+    const std::array<std::pair<const char*, bool>, 5> others = {
+        {{"--grid-item", !!arguments.item},
+         {"--x", !!arguments.x},
+         {"--y", !!arguments.y},
+         {"--time", !!arguments.time},
+         {"--grid-out", !!arguments.output}}};
+    for (const auto& [name, isGiven] : others)
+        if (isGiven && !arguments.grid)
+            return Needs(name, "--grid");
+    if (arguments.grid && !arguments.item)
         return Needs("--grid", "--grid-item");
-    return arguments.output ? Status::Ok() : Needs("--grid", "--grid-out");
+    return arguments.grid && !arguments.output ? Needs("--grid", "--grid-out") : Status::Ok();
+}
+
+/// A fault with the option that it is about before it.
+Status About(const char* option, const Status& fault) {
+    const std::string text = std::string(option) + ": " + fault.Text();
+    return fault.Kind() == Fault::System ? Status::SystemFault(text) : Status::InputFault(text);
+}
+
+Status NoName(const char* option) {
+    return Status::InputFault(
+        FormatText(kTextCliBadValue, option, "", std::string(Text(kTextCliExpectFile))));
+}
+
+/// The results are written over nothing but a file of earlier ones.
+Status TestOutput(const std::string& output, const std::string& grid) {
+    if (output.empty())
+        return NoName("--grid-out");
+    if (grid == output || IsSameFile(grid, output))
+        return About("--grid-out", Status::InputFault(FormatText(kTextCliOverInput, output)));
+    const Status replaceable = TestReplaceable(output, Consent::Given);
+    return replaceable ? replaceable : About("--grid-out", replaceable);
+}
+
+Status TakeRanges(const GridArguments& arguments, const CGridEditHeaderInfo& header,
+                  CTsq2InputKvf& input) {
+    Status taken =
+        TakeRange({"--x", arguments.x, true, header.SizeX()}, &input.X_Range_And_Interval);
+    if (taken)
+        taken = TakeRange({"--y", arguments.y, true, header.SizeY()}, &input.Y_Range_And_Interval);
+    if (taken)
+        taken = TakeRange({"--time", arguments.time, false, header.TimeStepPast()},
+                          &input.Time_Range_And_Interval);
+    return taken;
 }
 
 } // namespace
@@ -85,29 +120,26 @@ Status ApplyGridArguments(const GridArguments& arguments, const std::string& cal
                           CTsq2InputKvf& input) {
     if (Status fault = TestTogether(arguments); !fault || !arguments.grid)
         return fault;
-    const std::string grid = FullPath(*arguments.grid, callerDirectory);
-    const std::string output = FullPath(*arguments.output, callerDirectory);
-    if (grid == output || IsSameFile(grid, output))
-        return Status::InputFault(FormatText(kTextCliOverInput, *arguments.output));
+    const std::string grid = AbsoluteName(*arguments.grid, callerDirectory);
+    const std::string output = AbsoluteName(*arguments.output, callerDirectory);
+    if (grid.empty())
+        return NoName("--grid");
+    if (Status readable = TestReadable(grid); !readable)
+        return About("--grid", readable);
+    if (Status free = TestOutput(output, grid); !free)
+        return free;
     CGridEditEngine engine;
     if (engine.OpenFile(grid, true) != kGridOk)
-        return engine.LastError();
+        return About("--grid", engine.LastError());
     const CGridEditHeaderInfo header = engine.QueryHeaderInfo();
     if (*arguments.item > header.Items())
-        return Status::InputFault(
-            "--grid-item: " + FormatText(kTextGridItemMissing, *arguments.item, header.Items()));
-    Status taken =
-        TakeRange({"--x", arguments.x, true, header.SizeX()}, &input.X_Range_And_Interval);
-    if (taken)
-        taken = TakeRange({"--y", arguments.y, true, header.SizeY()}, &input.Y_Range_And_Interval);
-    if (taken)
-        taken = TakeRange({"--time", arguments.time, false, header.TimeStepPast()},
-                          &input.Time_Range_And_Interval);
+        return About("--grid-item", Status::InputFault(FormatText(
+                                        kTextGridItemMissing, *arguments.item, header.Items())));
     input.UseTsq2Input = true;
     input.Tsq2InputFile = grid;
     input.Tsq2OutputFile = output;
     input.Tsq2ItemNo = *arguments.item;
-    return taken;
+    return TakeRanges(arguments, header, input);
 }
 
 } // namespace ryn::cli

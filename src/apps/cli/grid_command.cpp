@@ -13,10 +13,12 @@
 #include "apps/cli/command_options.h"
 #include "apps/cli/engine_log.h"
 #include "apps/cli/grid_progress.h"
+#include "apps/cli/input_file.h"
 #include "apps/cli/launcher.h"
 #include "apps/cli/nearest_names.h"
 #include "apps/cli/part_jobs.h"
 #include "apps/cli/size_text.h"
+#include "base/path_parts.h"
 #include "base/process_limits.h"
 #include "base/stop_signals.h"
 #include "run/grid_parts.h"
@@ -37,7 +39,10 @@ Status TestSettings(CaseFile& file) {
     // Written so that NaN, which a hand-edited file can hold, is refused too.
     if (basic.SelectionMethod == kSelectPartialDurations && !(basic.AvgAnNum > 0.0))
         return Status::InputFault(FormatText(kTextCliGridNoRate, file.ShownName()));
-    return Status::Ok();
+    const CTsq2InputKvf& input = file.Root().GridInput();
+    return input.UseTsq2Input && !input.Tsq2InputFile.empty()
+               ? TestReadable(FullPath(input.Tsq2InputFile, SplitPath(file.Path()).directory))
+               : Status::Ok();
 }
 
 void ShowCounts(const BatchCounts& counts, Console& console) {
@@ -52,7 +57,8 @@ void ShowCounts(const BatchCounts& counts, Console& console) {
 }
 
 int ShowEnd(const GridBatchOutcome& outcome, bool hasLog, const CaseFile& file, Console& console) {
-    ShowCounts(outcome.counts, console);
+    if (outcome.end != BatchEnd::Stopped)
+        ShowCounts(outcome.counts, console);
     switch (outcome.end) {
     case BatchEnd::Written:
         ShowNote(console, FormatText(kTextCliGridWritten, outcome.outputFile,

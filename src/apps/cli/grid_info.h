@@ -6,7 +6,7 @@
 
 #include "apps/cli/json_output.h"
 #include "base/status.h"
-#include "grid/grid_records.h"
+#include "grid/grid_edit.h"
 #include "ports/progress_port.h"
 
 namespace ryn::cli {
@@ -18,9 +18,9 @@ struct GridInfo {
     std::vector<GridSummary> summaries;
 };
 
-/// Reads the description of a grid file and, for ranges and missing values, all of each item's
-/// first layer. A file that is no grid is a fault of one line.
-Status ReadGridInfo(const std::string& path, ProgressPort& progress, GridInfo* info);
+/// Reads from an open grid file its description and, for ranges and missing values, all of each
+/// item's first layer.
+Status ReadGridInfo(CGridEditEngine& engine, ProgressPort& progress, GridInfo* info);
 
 Json JsonOfGrid(const GridInfo& info);
 /// For people; `name` is the file's.

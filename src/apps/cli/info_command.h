@@ -7,7 +7,7 @@
 
 namespace ryn::cli {
 
-/// `ryn info`: what a data, parameter or result file holds.
+/// `ryn info`: what a data, grid, parameter or result file holds.
 struct InfoOptions {
     std::string file;
     OutputForm form = OutputForm::Text;

@@ -14,11 +14,12 @@ int RunNew(const NewOptions& options, Console& console) {
     CaseFile file(console, options.consent);
     if (const int refused = file.New(options.file))
         return refused;
-    if (const int refused =
-            Report(console, ApplyArguments(file.Root(), options.arguments, callerDirectory)))
-        return refused;
+    // Assignments come after, so that one to a keyword that --grid fills counts.
     if (const int refused = Report(
             console, ApplyGridArguments(options.grid, callerDirectory, file.Root().GridInput())))
+        return refused;
+    if (const int refused =
+            Report(console, ApplyArguments(file.Root(), options.arguments, callerDirectory)))
         return refused;
     return file.Save();
 }

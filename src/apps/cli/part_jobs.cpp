@@ -46,6 +46,7 @@ class Supervisor {
     void Start(Job& job) {
         ++job.starts;
         job.errors.clear();
+        job.process = ChildProcess();
         const Status started = job.process.Start(jobs.program, jobs.argumentsOf(job.part));
         if (!started)
             Fail(job, kExitSystem, started.Text());
@@ -77,20 +78,24 @@ class Supervisor {
     }
 
     void Read(Job& job) {
+        int exitCode = 0;
+        // Asked first, so that what it wrote before its end is read below.
+        const bool hasEnded = job.process.HasEnded(&exitCode);
         std::string text;
-        const bool writes = job.process.ReadOutput(&text);
-        const bool complains = job.process.ReadErrors(&job.errors);
+        job.process.ReadOutput(&text);
+        job.process.ReadErrors(&job.errors);
         if (!text.empty() && jobs.noteProgress)
             jobs.noteProgress();
         constexpr std::size_t kKept = 16384;
         if (job.errors.size() > kKept)
             job.errors.erase(0, job.errors.size() - kKept);
-        if (writes || complains || !job.process.IsRunning())
-            return;
-        const int exitCode = job.process.Wait();
-        if (exitCode == kExitDone)
-            return;
-        const bool died = exitCode == kExitSystem || exitCode >= 127;
+        if (hasEnded && exitCode != kExitDone)
+            TakeFailure(job, exitCode);
+    }
+
+    void TakeFailure(Job& job, int exitCode) {
+        constexpr int kFirstOfSystem = 126; // cannot be started, or ended by a signal
+        const bool died = exitCode == kExitSystem || exitCode >= kFirstOfSystem;
         if (died && job.starts < 2 && end.part == 0 && !end.wasStopped)
             Start(job);
         else

@@ -50,7 +50,7 @@ const BadCommandLine kCommands[] = {
      {},
      1,
      "ryn: no command is given; there are: import, export, info, new, set, check, extract, run, "
-     "show, fit, selfcheck (ryn --help tells the usage)\n"},
+     "show, grid, fit, selfcheck (ryn --help tells the usage)\n"},
     {"UnknownCommand", {"exprt", "s.tsq0"}, 1, "ryn: unknown command exprt; nearest: export\n"},
     {"OptionsWithoutCommand", {"--lang", "en"}, 1, "ryn: no command is given; there are: *"},
     {"UnknownOption",

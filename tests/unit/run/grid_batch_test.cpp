@@ -11,7 +11,7 @@
 #include "run/extract_command.h"
 #include "run/result_layout.h"
 #include "support/sample_series.h"
-#include "unit/run/sample_batch.h"
+#include "support/sample_batch.h"
 
 namespace ryn {
 namespace {

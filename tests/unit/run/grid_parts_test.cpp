@@ -5,7 +5,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "unit/run/sample_batch.h"
+#include "support/sample_batch.h"
 
 namespace ryn {
 namespace {
