@@ -266,6 +266,23 @@ TEST(MaximumLikelihood, SaysWhyThereIsNoEstimate) {
     }
 }
 
+// The profile rises again as kappa comes to 1. At the maximum and at that end ln L, by arithmetic
+// of 50 digits, is -23.1154 and -23.1765 in the first sample, -21.8528 and -21.8109 in the second.
+// A grid of 400 theta in equal ratios up to the largest value takes the wrong side in both.
+TEST(MaximumLikelihood, TellsAParetoMaximumFromAHigherEndCloseBy) {
+    const std::vector<double> inside = {20.4, 21.1, 21.6, 22.6, 23.1, 23.3,
+                                        23.7, 24.0, 24.9, 25.7, 28.2};
+    const std::vector<double> atEnd = {20.7, 21.1, 21.2, 22.1, 22.5, 22.7, 23.4, 24.3, 28.1, 28.8};
+    const FitResult fit = Fit(Named("GP2/ML"), {inside, kPeaks});
+    ASSERT_TRUE(fit);
+    const auto values = EstimatedValues(fit->distribution);
+    EXPECT_NEAR(values[0], 6.17408754298898, 1e-11);
+    EXPECT_NEAR(values[1], 0.718961260739076, 1e-12);
+    const FitResult refused = Fit(Named("GP2/ML"), {atEnd, kPeaks});
+    ASSERT_FALSE(refused);
+    EXPECT_EQ(FailureCode(refused.Failure()), "C11");
+}
+
 // What is no sample of the distribution at all ends in an estimate or in a failure, never in
 // numbers that are none.
 TEST(MaximumLikelihood, StandsHostileSamples) {
