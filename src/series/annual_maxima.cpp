@@ -29,6 +29,12 @@ class Period {
     bool Holds(const COleDateTime& date) const {
         return date >= start && IsClearlyBefore(date, end);
     }
+    /// Whether both are certain at a glance: away from the edges of a year without a season. Most
+    /// samples of a long series lie so.
+    bool SurelyHolds(const COleDateTime& date) const {
+        return !season && date.LinearCount() > start.LinearCount() &&
+               date.LinearCount() < end.LinearCount() - 2.0 * COleDateTime::kHalfSecond;
+    }
     void MoveTo(int newYear) {
         year = newYear;
         if (!season) {
@@ -73,11 +79,12 @@ AnnualMaxima SelectAnnualMaxima(SampleArray& samples, const SelectionRules& rule
     const STSItem* current = nullptr;
     const STSItem* previous = nullptr;
     for (STSItem& sample : samples) {
-        if (!period.Admits(sample.date))
+        const bool isHeld = period.SurelyHolds(sample.date);
+        if (!isHeld && !period.Admits(sample.date))
             continue;
         previous = current;
         current = &sample;
-        if (period.Holds(sample.date)) {
+        if (isHeld || period.Holds(sample.date)) {
             if (sample.value > best->value)
                 best = &sample;
             continue;

@@ -1,8 +1,10 @@
 #include "series/tsq_values.h"
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
+#include <cstdint>
 #include <new>
 #include <string_view>
 
@@ -117,6 +119,8 @@ struct CTsqValues::OpenItem {
             startCount + EquidistantSpan(index, axis.step * toSecondsFactor).GetTotalDays());
     }
 
+    /// Fills the samples of consecutive steps, from `first` on.
+    void FillSamples(int first, const TsqBlock& block, STSItem* samples) const;
     Status UnderstandAxis(const std::string& path);
     Status FindItem(const std::string& path);
     /// The time of a step by the file, in the axis's unit.
@@ -170,6 +174,33 @@ Status CTsqValues::OpenItem::FindItem(const std::string& path) {
     if (tsqFindBlockDynamic(header.get(), file.get()) != 0)
         return tsqTakeError();
     return Status::Ok();
+}
+
+// Steps of whole days or hours, which most long series have, need no seconds: the sums are those
+// that DateByStep makes, and these loops are most of the reading of a series in memory.
+void CTsqValues::OpenItem::FillSamples(int first, const TsqBlock& block, STSItem* samples) const {
+    constexpr double kLongest = 1e6;
+    const double hours = axis.step * toSecondsFactor / 3600.0;
+    const bool hasWholeHours =
+        axis.IsEquidistant() && hours == std::trunc(hours) && hours > 0.0 && hours < kLongest;
+    const auto fill = [&](int i, const COleDateTime& date) {
+        samples[i] = {date, static_cast<double>(block.values[i]), 0};
+    };
+    const auto fillAt = [&](int i, double days) {
+        fill(i, COleDateTime::FromLinearCount(startCount + days));
+    };
+    if (hasWholeHours && std::fmod(hours, 24.0) == 0.0) {
+        for (int i = 0; i < block.count; ++i)
+            fillAt(i, (first + i) * (hours / 24.0));
+    } else if (hasWholeHours) {
+        for (int i = 0; i < block.count; ++i) {
+            const std::int64_t passed = static_cast<std::int64_t>(hours) * (first + i);
+            fillAt(i, static_cast<double>(passed / 24) + static_cast<double>(passed % 24) / 24.0);
+        }
+    } else {
+        for (int i = 0; i < block.count; ++i)
+            fill(i, axis.IsEquidistant() ? DateByStep(first + i) : DateByFile(block.times[i]));
+    }
 }
 
 template <typename Use>
@@ -252,25 +283,18 @@ bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) try {
         return false;
     SampleArray read;
     read.reserve(static_cast<std::size_t>(open.axis.count));
-    bool datesValid = true;
-    const auto append = [&](const COleDateTime& date, float value) {
-        datesValid = datesValid && date.IsValid();
-        read.push_back({date, static_cast<double>(value), 0});
-    };
     const bool whole = open.Walk([&](int step, const TsqBlock& block) {
         ports->progress->ShowProgress(step, open.axis.count);
-        if (open.axis.IsEquidistant()) {
-            for (int i = 0; i < block.count; ++i)
-                append(open.DateByStep(step + i), block.values[i]);
-        } else {
-            for (int i = 0; i < block.count; ++i)
-                append(open.DateByFile(block.times[i]), block.values[i]);
-        }
-        return datesValid;
+        const std::size_t before = read.size();
+        read.resize(before + static_cast<std::size_t>(block.count));
+        open.FillSamples(step, block, read.data() + before);
+        return true;
     });
+    const bool datesValid =
+        std::ranges::all_of(read, [](const STSItem& sample) { return sample.date.IsValid(); });
     ports->progress->ShowProgress(open.axis.count, open.axis.count);
-    if (!whole) {
-        readError = datesValid ? tsqTakeError() : TimeOutOfCalendar(path);
+    if (!whole || !datesValid) {
+        readError = whole ? TimeOutOfCalendar(path) : tsqTakeError();
         return false;
     }
     TakeOver(open);
