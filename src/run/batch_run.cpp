@@ -152,6 +152,9 @@ void BatchRun::SetActivity(const std::vector<bool>& found) {
             states[p] = PointState::Waiting;
     outcome.counts.active = static_cast<int>(std::count(active.begin(), active.end(), true));
     lines.emplace(active, options.print);
+    for (std::size_t p = 0; p < active.size(); ++p)
+        if (active[p])
+            lastActive = static_cast<int>(p);
 }
 
 GridPoint BatchRun::OffsetsOf(int point) const {
@@ -219,6 +222,14 @@ bool BatchRun::RunPoint(int point, CTsq0FileInfo& files, const TakeResults& take
     return Take(point, ended);
 }
 
+/// The last points are run again when all are done; reading them anew takes long where each value
+/// of a history lies apart from the next.
+void BatchRun::KeepIfNeeded(int point) {
+    constexpr int kKept = 16;
+    if (share == BatchShare::Whole && point > lastActive - kKept)
+        series.KeepHistory(point);
+}
+
 bool BatchRun::RunPart(const GridTile& part, const TakeResults& take) {
     const std::optional<std::size_t> memory = MemoryForTile();
     if (!memory)
@@ -234,43 +245,29 @@ bool BatchRun::RunPart(const GridTile& part, const TakeResults& take) {
     return read ? goesOn : Fail(std::move(read));
 }
 
-/// Reads one point's series and runs it, without noting anything.
-bool BatchRun::RunAgain(int point, PointTrace trace, PointOutcome* ended) {
+bool BatchRun::LeaveFilesOf(int point) {
     const std::optional<std::size_t> memory = MemoryForTile();
     if (!memory)
         return false;
-    const GridPoint place = Plan().PointAt(point);
-    GridTile tile = Plan().Whole();
-    tile.firstX = place.x;
-    tile.firstY = place.y;
-    tile.countX = tile.countY = 1;
+    std::vector<int> points;
+    for (int p = point - 1; p >= 0 && points.empty(); --p)
+        if (states[static_cast<std::size_t>(p)] == PointState::Good)
+            points.push_back(p);
+    points.push_back(point);
     ScratchFiles scratch = MakeScratch();
-    Status read = series.ForEachPoint(
-        tile, *memory, active, scratch, [&](int /*point*/, CTsq0FileInfo& files) {
-            *ended = analysis.Run({files.Path(), files.NameSeries(), ""}, trace);
-            return Next::GoOn;
-        });
+    PointOutcome ended;
+    Status read = series.ForPoints(points, *memory, scratch, [&](int each, CTsq0FileInfo& files) {
+        ended = analysis.Run({files.Path(), files.NameSeries(), ""},
+                             each == point ? PointTrace::Files : PointTrace::None);
+        return ended.end == PointEnd::Broken ? Next::Stop : Next::GoOn;
+    });
     if (!read)
         return Fail(std::move(read));
-    return ended->end == PointEnd::Broken ? Fail(Status::SystemFault(ended->reason.Text())) : true;
-}
-
-bool BatchRun::LeaveFilesOf(int point) {
-    PointOutcome ended;
-    for (int p = point - 1; p >= 0; --p)
-        if (states[static_cast<std::size_t>(p)] == PointState::Good) {
-            if (!RunAgain(p, PointTrace::None, &ended))
-                return false;
-            break;
-        }
-    return RunAgain(point, PointTrace::Files, &ended);
+    return ended.end == PointEnd::Broken ? Fail(Status::SystemFault(ended.reason.Text())) : true;
 }
 
 bool BatchRun::LeaveLastFiles() {
-    for (int p = Plan().Points() - 1; p >= 0; --p)
-        if (active[static_cast<std::size_t>(p)])
-            return LeaveFilesOf(p);
-    return true;
+    return lastActive < 0 || LeaveFilesOf(lastActive);
 }
 
 bool BatchRun::WriteOutput(ResultGrids& grids) {

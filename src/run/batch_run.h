@@ -89,7 +89,7 @@ class BatchRun {
     bool End(BatchEnd how, Status reason);
     bool Take(int point, const PointOutcome& ended);
     bool LeaveFilesOf(int point);
-    bool RunAgain(int point, PointTrace trace, PointOutcome* ended);
+    void KeepIfNeeded(int point);
     std::size_t TileBytes(double allowed) const;
     bool LeavesEachPointsFiles() const;
     std::string KeptNameOf(int point) const;
@@ -106,6 +106,7 @@ class BatchRun {
     double resultBytes = 0.0;
     std::vector<bool> active;
     std::vector<PointState> states;
+    int lastActive = -1; ///< number of the last point that takes part
     std::optional<ComputationLines> lines;
     int done = 0; ///< points with a result, good or not
     GridBatchOutcome outcome;

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <map>
 #include <system_error>
 #include <utility>
 
@@ -60,7 +61,9 @@ class PartRun {
         return wanted;
     }
     bool MakeDirectory();
-    bool RunTile(std::size_t index);
+    bool Stands(std::size_t index) const;
+    bool RunTiles(std::size_t first, std::size_t end);
+    bool RunGroup(const GridTile& group, std::size_t first, std::size_t end);
     void Print(int text, std::size_t index);
 
     GridBatchOptions options;
@@ -83,32 +86,75 @@ bool PartRun::MakeDirectory() {
     return error ? run.Fail(Status::FromErrno(TileDirectory(run.Plan()), error.value())) : true;
 }
 
-bool PartRun::RunTile(std::size_t index) {
-    const std::string name = TileName(run.Plan(), index, tiles.size());
+bool PartRun::Stands(std::size_t index) const {
     ResultTile tile;
-    const auto items = static_cast<std::size_t>(run.Layout().Items());
-    if (ReadResultTile(name, fingerprint, items, &tile)) {
-        Print(kTextGridTileStands, index);
-        return true;
-    }
-    tile.fingerprint = fingerprint;
-    const BatchCounts before = run.Outcome().counts;
-    const auto take = [&](int point, const std::vector<float>& results) {
-        tile.points.push_back({point, true, results});
-    };
-    if (!run.RunPart(tiles[index], take))
+    return static_cast<bool>(ReadResultTile(TileName(run.Plan(), index, tiles.size()), fingerprint,
+                                            static_cast<std::size_t>(run.Layout().Items()), &tile));
+}
+
+/// The part of the grid that two tiles cover together; nothing where they leave some of it out.
+std::optional<GridTile> Joined(const GridTile& a, const GridTile& b) {
+    GridTile both = a;
+    both.firstX = std::min(a.firstX, b.firstX);
+    both.firstY = std::min(a.firstY, b.firstY);
+    both.countX = std::max(a.firstX + a.countX, b.firstX + b.countX) - both.firstX;
+    both.countY = std::max(a.firstY + a.countY, b.firstY + b.countY) - both.firstY;
+    return both.Points() == a.Points() + b.Points() ? std::optional(both) : std::nullopt;
+}
+
+// Tiles that are read in one go are run in one go, since a file is read in the longer runs the
+// larger the part of it is.
+bool PartRun::RunTiles(std::size_t first, std::size_t end) {
+    const std::optional<std::size_t> memory = run.MemoryForTile();
+    if (!memory)
         return false;
-    // Those that failed have left no results.
-    for (const int point : run.PointsOf(tiles[index]))
-        if (run.States()[static_cast<std::size_t>(point)] == PointState::Failed)
-            tile.points.push_back({point, false, {}});
-    const BatchCounts& after = run.Outcome().counts;
-    tile.withMissing = after.withMissing - before.withMissing;
-    tile.withFewerPeaks = after.withFewerPeaks - before.withFewerPeaks;
-    tile.withMissingYears = after.withMissingYears - before.withMissingYears;
-    if (Status written = WriteResultTile(tile, name); !written)
-        return run.Fail(std::move(written));
-    Print(kTextGridTileWritten, index);
+    for (std::size_t i = first; i < end;) {
+        if (Stands(i)) {
+            Print(kTextGridTileStands, i++);
+            continue;
+        }
+        GridTile group = tiles[i];
+        std::size_t past = i + 1;
+        for (; past < end && !Stands(past); ++past) {
+            const std::optional<GridTile> both = Joined(group, tiles[past]);
+            if (!both || both->Values() * sizeof(float) > *memory / 4 * 3) // reading takes some too
+                break;
+            group = *both;
+        }
+        if (!RunGroup(group, i, past))
+            return false;
+        i = past;
+    }
+    return true;
+}
+
+bool PartRun::RunGroup(const GridTile& group, std::size_t first, std::size_t end) {
+    std::map<int, std::vector<float>> good;
+    const BatchCounts before = run.Outcome().counts;
+    if (!run.RunPart(group, [&good](int point, const std::vector<float>& results) {
+            good.emplace(point, results);
+        }))
+        return false;
+    // What was found besides is counted once, with the first of the tiles.
+    BatchCounts found = run.Outcome().counts;
+    found.withMissing -= before.withMissing;
+    found.withFewerPeaks -= before.withFewerPeaks;
+    found.withMissingYears -= before.withMissingYears;
+    for (std::size_t i = first; i < end; ++i) {
+        ResultTile tile;
+        tile.fingerprint = fingerprint;
+        tile.withMissing = i == first ? found.withMissing : 0;
+        tile.withFewerPeaks = i == first ? found.withFewerPeaks : 0;
+        tile.withMissingYears = i == first ? found.withMissingYears : 0;
+        for (const int point : run.PointsOf(tiles[i])) {
+            const auto results = good.find(point);
+            const bool isGood = results != good.end();
+            tile.points.push_back({point, isGood, isGood ? results->second : std::vector<float>()});
+        }
+        if (Status written = WriteResultTile(tile, TileName(run.Plan(), i, tiles.size())); !written)
+            return run.Fail(std::move(written));
+        Print(kTextGridTileWritten, i);
+    }
     return true;
 }
 
@@ -118,16 +164,14 @@ GridBatchOutcome PartRun::Execute() {
     fingerprint = FingerprintOf(run, owner);
     if (!PlanResultTiles(run, part.count, &tiles))
         return std::move(run.Outcome());
-    run.ExpectResultsOf(run.Plan().Points() / static_cast<int>(tiles.size()) + 1);
+    run.ExpectResultsOf(run.Plan().Points() / part.count + 1);
     if (!MakeDirectory() || !run.ReadActivity())
         return std::move(run.Outcome());
     const auto count = static_cast<std::size_t>(part.count);
     const std::size_t first = tiles.size() * static_cast<std::size_t>(part.number - 1) / count;
     const std::size_t end = tiles.size() * static_cast<std::size_t>(part.number) / count;
-    for (std::size_t i = first; i < end; ++i)
-        if (!RunTile(i))
-            return std::move(run.Outcome());
-    run.Outcome().end = BatchEnd::Written;
+    if (RunTiles(first, end))
+        run.Outcome().end = BatchEnd::Written;
     return std::move(run.Outcome());
 }
 

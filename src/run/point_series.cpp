@@ -1,6 +1,7 @@
 #include "run/point_series.h"
 
 #include <algorithm>
+#include <climits>
 #include <new>
 #include <span>
 
@@ -107,8 +108,6 @@ Status PointSeries::ReadActivity(std::size_t memory, std::vector<bool>* active) 
 
 Status PointSeries::MakeOne(CTsq0FileInfo& series, int point, const float* values) {
     const auto steps = static_cast<std::size_t>(plan.Steps());
-    const std::span<const float> history(values, steps);
-    withMissing += std::ranges::find(history, header.DeleteValue()) != history.end() ? 1 : 0;
     const bool good = series.Create(header, point, plan.item, startDate, startTime, true) &&
                       series.WriteValues(seconds.data(), values, steps) && series.Close();
     return good ? Status::Ok() : StoreError(series);
@@ -121,10 +120,9 @@ PointSeries::ForEachPoint(const GridTile& part, std::size_t memory, const std::v
     std::vector<GridTile> tiles;
     if (engine.PlanTiles(part, memory, &tiles) != kGridOk)
         return engine.LastError();
-    std::vector<float> values;
     for (const GridTile& tile : tiles) {
-        values.resize(tile.Values());
-        if (engine.ReadTile(tile, memory, values) != kGridOk)
+        tileValues.resize(tile.Values());
+        if (engine.ReadTile(tile, memory, tileValues) != kGridOk)
             return engine.LastError();
         Status made;
         const Next next = ForEachPlace(plan, tile, [&](int point, std::size_t offset) {
@@ -133,11 +131,79 @@ PointSeries::ForEachPoint(const GridTile& part, std::size_t memory, const std::v
             CTsq0FileInfo series(scratch);
             const GridPoint place = plan.PointAt(point);
             series.SetPosition(place.x, place.y);
-            made = MakeOne(series, point, values.data() + offset);
+            history = tileValues.data() + offset;
+            const std::span<const float> whole(history, static_cast<std::size_t>(plan.Steps()));
+            withMissing += std::ranges::find(whole, header.DeleteValue()) != whole.end() ? 1 : 0;
+            made = MakeOne(series, point, history);
             return made ? use(point, series) : Next::Stop;
         });
         if (next == Next::Stop)
             return made;
+    }
+    return Status::Ok();
+} catch (const std::bad_alloc&) {
+    return NotEnoughMemory();
+}
+
+void PointSeries::KeepHistory(int point) {
+    kept[point].assign(history, history + plan.Steps());
+}
+
+Status PointSeries::ReadHistories(const std::vector<int>& points, std::size_t memory) {
+    GridTile tile = plan.Whole();
+    int lastX = -1;
+    int lastY = -1;
+    tile.firstX = tile.firstY = INT_MAX;
+    for (const int point : points) {
+        const GridPoint place = plan.PointAt(point);
+        tile.firstX = std::min(tile.firstX, place.x);
+        tile.firstY = std::min(tile.firstY, place.y);
+        lastX = std::max(lastX, place.x);
+        lastY = std::max(lastY, place.y);
+    }
+    tile.countX = lastX - tile.firstX + 1;
+    tile.countY = lastY - tile.firstY + 1;
+    constexpr std::size_t kClose = 16;
+    if (points.size() > 1 && tile.Points() > kClose * points.size()) {
+        for (const int point : points)
+            if (Status read = ReadHistories({point}, memory); !read)
+                return read;
+        return Status::Ok();
+    }
+    std::vector<GridTile> tiles;
+    std::vector<float> values;
+    if (engine.PlanTiles(tile, memory, &tiles) != kGridOk)
+        return engine.LastError();
+    for (const GridTile& part : tiles) {
+        values.resize(part.Values());
+        if (engine.ReadTile(part, memory, values) != kGridOk)
+            return engine.LastError();
+        ForEachPlace(plan, part, [&](int point, std::size_t offset) {
+            history = values.data() + offset;
+            if (std::ranges::find(points, point) != points.end())
+                KeepHistory(point);
+            return Next::GoOn;
+        });
+    }
+    return Status::Ok();
+}
+
+Status
+PointSeries::ForPoints(const std::vector<int>& points, std::size_t memory, ScratchFiles& scratch,
+                       const std::function<Next(int point, CTsq0FileInfo& series)>& use) try {
+    std::vector<int> missing = points;
+    std::erase_if(missing, [this](int point) { return kept.contains(point); });
+    if (!missing.empty())
+        if (Status read = ReadHistories(missing, memory); !read)
+            return read;
+    for (const int point : points) {
+        CTsq0FileInfo series(scratch);
+        const GridPoint place = plan.PointAt(point);
+        series.SetPosition(place.x, place.y);
+        if (Status made = MakeOne(series, point, kept[point].data()); !made)
+            return made;
+        if (use(point, series) == Next::Stop)
+            break;
     }
     return Status::Ok();
 } catch (const std::bad_alloc&) {

@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <functional>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -51,6 +52,13 @@ class PointSeries {
                         ScratchFiles& scratch,
                         const std::function<Next(int point, CTsq0FileInfo& series)>& use);
 
+    /// Within `use`: keeps the history of that point, so that it need not be read again.
+    void KeepHistory(int point);
+    /// Calls `use` with the series of some active points, in the order given; those whose history
+    /// was not kept are read, in one go where they lie close together.
+    Status ForPoints(const std::vector<int>& points, std::size_t memory, ScratchFiles& scratch,
+                     const std::function<Next(int point, CTsq0FileInfo& series)>& use);
+
     /// Makes the series of points `first` to `end` - 1 in one walk through the time steps; all are
     /// open at once. Each point's record says whether it takes part.
     Status MakeSeries(std::vector<CTsq0FileInfo>& points, int first, int end,
@@ -60,6 +68,7 @@ class PointSeries {
     int SeriesWithMissing() const { return withMissing; }
 
   private:
+    Status ReadHistories(const std::vector<int>& points, std::size_t memory);
     Status MakeOne(CTsq0FileInfo& series, int point, const float* values);
     Status BeginAll(std::vector<CTsq0FileInfo>& points, int first, int end,
                     const CQxArray2D<float>& plane);
@@ -72,6 +81,9 @@ class PointSeries {
     std::string startTime;
     std::vector<double> seconds; ///< of each step, from the first one used
     int withMissing = 0;
+    std::vector<float> tileValues;  ///< their memory serves the next tile
+    const float* history = nullptr; ///< of the point being used
+    std::map<int, std::vector<float>> kept;
 };
 
 } // namespace ryn

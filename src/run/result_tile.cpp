@@ -74,7 +74,7 @@ Status WriteResultTile(const ResultTile& tile, const std::string& path) {
             kvfAddFloat(tree.get(), result);
     }
     kvfEndSection(tree.get());
-    return kvfWrite(tree.get(), path, Durability::Flushed);
+    return kvfWrite(tree.get(), path, Durability::Unflushed);
 }
 
 Status ReadResultTile(const std::string& path, const std::string& fingerprint, std::size_t items,

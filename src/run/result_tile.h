@@ -25,7 +25,7 @@ struct ResultTile {
     std::vector<Point> points; ///< the active ones
 };
 
-/// Writes a tile whole or not at all.
+/// Writes a tile whole or not at all. It is not flushed: one that a power cut takes is made anew.
 Status WriteResultTile(const ResultTile& tile, const std::string& path);
 
 /// Reads a tile whose points each have `items` results. A file that is missing, broken, or not made

@@ -1,5 +1,6 @@
 #include "series/annual_maxima.h"
 
+#include <algorithm>
 #include <optional>
 
 #include "series/season.h"
@@ -68,6 +69,12 @@ void MovePeriod(Period& period, const COleDateTime& date, std::vector<int>& miss
     }
 }
 
+void Mark(STSItem& sample, std::vector<const STSItem*>& selection) {
+    if (sample.selected == 0)
+        selection.push_back(&sample);
+    sample.selected = 1;
+}
+
 } // namespace
 
 AnnualMaxima SelectAnnualMaxima(SampleArray& samples, const SelectionRules& rules) {
@@ -91,14 +98,13 @@ AnnualMaxima SelectAnnualMaxima(SampleArray& samples, const SelectionRules& rule
         }
         MovePeriod(period, sample.date, result.missingYears);
         if (previous != nullptr)
-            best->selected = 1;
+            Mark(*best, result.selection);
         best = &sample;
     }
     if (previous != nullptr)
-        best->selected = 1;
-    for (const STSItem& sample : samples)
-        if (sample.selected != 0)
-            result.selection.push_back(&sample);
+        Mark(*best, result.selection);
+    // In file order, which the walk has already where the dates ascend.
+    std::sort(result.selection.begin(), result.selection.end());
     return result;
 }
 

@@ -119,8 +119,8 @@ struct CTsqValues::OpenItem {
             startCount + EquidistantSpan(index, axis.step * toSecondsFactor).GetTotalDays());
     }
 
-    /// Fills the samples of consecutive steps, from `first` on.
-    void FillSamples(int first, const TsqBlock& block, STSItem* samples) const;
+    /// Appends the samples of consecutive steps, from `first` on.
+    void AppendSamples(int first, const TsqBlock& block, SampleArray* samples) const;
     Status UnderstandAxis(const std::string& path);
     Status FindItem(const std::string& path);
     /// The time of a step by the file, in the axis's unit.
@@ -178,28 +178,29 @@ Status CTsqValues::OpenItem::FindItem(const std::string& path) {
 
 // Steps of whole days or hours, which most long series have, need no seconds: the sums are those
 // that DateByStep makes, and these loops are most of the reading of a series in memory.
-void CTsqValues::OpenItem::FillSamples(int first, const TsqBlock& block, STSItem* samples) const {
+void CTsqValues::OpenItem::AppendSamples(int first, const TsqBlock& block,
+                                         SampleArray* samples) const {
     constexpr double kLongest = 1e6;
     const double hours = axis.step * toSecondsFactor / 3600.0;
     const bool hasWholeHours =
         axis.IsEquidistant() && hours == std::trunc(hours) && hours > 0.0 && hours < kLongest;
-    const auto fill = [&](int i, const COleDateTime& date) {
-        samples[i] = {date, static_cast<double>(block.values[i]), 0};
+    const auto append = [&](int i, const COleDateTime& date) {
+        samples->push_back({date, static_cast<double>(block.values[i]), 0});
     };
-    const auto fillAt = [&](int i, double days) {
-        fill(i, COleDateTime::FromLinearCount(startCount + days));
+    const auto appendAt = [&](int i, double days) {
+        append(i, COleDateTime::FromLinearCount(startCount + days));
     };
     if (hasWholeHours && std::fmod(hours, 24.0) == 0.0) {
         for (int i = 0; i < block.count; ++i)
-            fillAt(i, (first + i) * (hours / 24.0));
+            appendAt(i, (first + i) * (hours / 24.0));
     } else if (hasWholeHours) {
         for (int i = 0; i < block.count; ++i) {
             const std::int64_t passed = static_cast<std::int64_t>(hours) * (first + i);
-            fillAt(i, static_cast<double>(passed / 24) + static_cast<double>(passed % 24) / 24.0);
+            appendAt(i, static_cast<double>(passed / 24) + static_cast<double>(passed % 24) / 24.0);
         }
     } else {
         for (int i = 0; i < block.count; ++i)
-            fill(i, axis.IsEquidistant() ? DateByStep(first + i) : DateByFile(block.times[i]));
+            append(i, axis.IsEquidistant() ? DateByStep(first + i) : DateByFile(block.times[i]));
     }
 }
 
@@ -285,13 +286,13 @@ bool CTsqValues::ReadSeries(const std::string& path, int itemIndex) try {
     read.reserve(static_cast<std::size_t>(open.axis.count));
     const bool whole = open.Walk([&](int step, const TsqBlock& block) {
         ports->progress->ShowProgress(step, open.axis.count);
-        const std::size_t before = read.size();
-        read.resize(before + static_cast<std::size_t>(block.count));
-        open.FillSamples(step, block, read.data() + before);
+        open.AppendSamples(step, block, &read);
         return true;
     });
+    const auto isDated = [](const STSItem& sample) { return sample.date.IsValid(); };
     const bool datesValid =
-        std::ranges::all_of(read, [](const STSItem& sample) { return sample.date.IsValid(); });
+        read.empty() || (open.axis.IsEquidistant() ? isDated(read.front()) && isDated(read.back())
+                                                   : std::ranges::all_of(read, isDated));
     ports->progress->ShowProgress(open.axis.count, open.axis.count);
     if (!whole || !datesValid) {
         readError = whole ? TimeOutOfCalendar(path) : tsqTakeError();
