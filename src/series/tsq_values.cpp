@@ -196,7 +196,8 @@ void CTsqValues::OpenItem::AppendSamples(int first, const TsqBlock& block,
     } else if (hasWholeHours) {
         for (int i = 0; i < block.count; ++i) {
             const std::int64_t passed = static_cast<std::int64_t>(hours) * (first + i);
-            appendAt(i, static_cast<double>(passed / 24) + static_cast<double>(passed % 24) / 24.0);
+            const std::int64_t days = passed / 24;
+            appendAt(i, static_cast<double>(days) + static_cast<double>(passed - days * 24) / 24.0);
         }
     } else {
         for (int i = 0; i < block.count; ++i)

@@ -10,8 +10,8 @@
 #include "run/batch_lines.h"
 #include "run/extract_command.h"
 #include "run/result_layout.h"
-#include "support/sample_series.h"
 #include "support/sample_batch.h"
+#include "support/sample_series.h"
 
 namespace ryn {
 namespace {
