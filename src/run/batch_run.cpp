@@ -6,6 +6,7 @@
 #include "base/atomic_file.h"
 #include "base/path_parts.h"
 #include "base/process_limits.h"
+#include "results/result_file.h"
 #include "strings/catalogue.h"
 
 namespace ryn {
@@ -63,6 +64,11 @@ Status BatchRun::TestFiles(const GridPlan& plan) {
          {plan.gridFile, document.GetPathName(), analysis.ParameterFile(), results})
         if (plan.outputFile == other || IsSameFile(plan.outputFile, other))
             return Status::InputFault(FormatText(kTextGridOutputTaken, plan.outputFile));
+    // By a link, which a save follows.
+    for (const std::string& other : {plan.gridFile, document.GetPathName()})
+        if (IsSameFile(analysis.ParameterFile(), other))
+            return Status::InputFault(
+                FormatText(kTextGridPointFileTaken, analysis.ParameterFile()));
     if (Status free = document.TestResultFileName(); !free)
         return free;
     for (const std::string& written : {plan.outputFile, analysis.ParameterFile(), results})
@@ -245,6 +251,14 @@ bool BatchRun::RunPart(const GridTile& part, const TakeResults& take) {
     return read ? goesOn : Fail(std::move(read));
 }
 
+/// The save before the last point's run writes the results of the last good point before it or,
+/// without one, those that the document was opened with.
+void BatchRun::RestoreResults() {
+    document.Results().Clear();
+    if (const std::string& file = root.DefineEVS().OutputFileName; !file.empty())
+        (void)ReadResultFile(document.Results(), file, SplitPath(document.GetPathName()).directory);
+}
+
 bool BatchRun::LeaveFilesOf(int point) {
     const std::optional<std::size_t> memory = MemoryForTile();
     if (!memory)
@@ -253,6 +267,8 @@ bool BatchRun::LeaveFilesOf(int point) {
     for (int p = point - 1; p >= 0 && points.empty(); --p)
         if (states[static_cast<std::size_t>(p)] == PointState::Good)
             points.push_back(p);
+    if (points.empty())
+        RestoreResults();
     points.push_back(point);
     ScratchFiles scratch = MakeScratch();
     PointOutcome ended;

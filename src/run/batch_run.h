@@ -61,8 +61,8 @@ class BatchRun {
     void NotePoint(int point, PointState state);
 
     /// Leaves the files that a batch on disk leaves behind its last point, which are those of that
-    /// point with the results of the last good one before it, and the document with the results of
-    /// the last good point.
+    /// point with the results of the last good one before it, or those that were there before the
+    /// batch; and the document with the results of the last good point.
     bool LeaveLastFiles();
     /// Writes the output grid file.
     bool WriteOutput(ResultGrids& grids);
@@ -88,6 +88,7 @@ class BatchRun {
     Status TestFiles(const GridPlan& plan);
     bool End(BatchEnd how, Status reason);
     bool Take(int point, const PointOutcome& ended);
+    void RestoreResults();
     bool LeaveFilesOf(int point);
     void KeepIfNeeded(int point);
     std::size_t TileBytes(double allowed) const;

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <filesystem>
 #include <map>
+#include <string_view>
 #include <system_error>
 #include <utility>
 
@@ -25,17 +26,73 @@ std::string TileName(const GridPlan& plan, std::size_t tile, std::size_t count) 
     return TileDirectory(plan) + "/" + std::to_string(tile + 1) + "of" + std::to_string(count);
 }
 
+bool SkipDigits(std::string_view* text) {
+    const std::size_t end = std::min(text->find_first_not_of("0123456789"), text->size());
+    text->remove_prefix(end);
+    return end > 0;
+}
+
+/// Whether a name is that of a tile, for any number of parts, or of one that was being written when
+/// its part was killed.
+bool IsNameOfTile(std::string_view name) {
+    const bool isTemporary = name.starts_with('.');
+    name.remove_prefix(isTemporary ? 1 : 0);
+    if (!SkipDigits(&name) || !name.starts_with("of"))
+        return false;
+    name.remove_prefix(2);
+    return SkipDigits(&name) && name.starts_with('.') == isTemporary && name.empty() != isTemporary;
+}
+
+/// What cannot be removed does no harm.
+void RemoveTiles(const std::string& directory) {
+    std::error_code error;
+    std::vector<std::filesystem::path> found;
+    for (std::filesystem::directory_iterator entry(directory, error), end; !error && entry != end;
+         entry.increment(error))
+        if (IsNameOfTile(entry->path().filename().string()))
+            found.push_back(entry->path());
+    for (const std::filesystem::path& path : found)
+        std::filesystem::remove(path, error);
+    std::filesystem::remove(directory, error);
+}
+
 /// The tiles of the whole grid: the same for every share, wherever and with however much memory it
 /// runs.
 bool PlanResultTiles(BatchRun& run, int parts, std::vector<GridTile>* tiles) {
-    // A tile is a text of some 16 bytes a number, and must stay far below what a text may hold.
-    constexpr double kMostBytes = 64.0 * 1024 * 1024;
+    // A tile is a text of some 16 bytes a number, and several times that where it is in memory,
+    // which no limit may be too small for.
+    constexpr double kMostBytes = 8.0 * 1024 * 1024;
     const double bytes = 16.0 * static_cast<double>(run.Layout().Items()) * run.Plan().Points();
     const auto pieces = std::max<std::int64_t>(std::int64_t{kTilesOfAPart} * parts,
                                                static_cast<std::int64_t>(bytes / kMostBytes) + 1);
     Status divided = run.Series().Divide(
         static_cast<int>(std::min<std::int64_t>(pieces, run.Plan().Points())), tiles);
     return divided ? true : run.Fail(std::move(divided));
+}
+
+/// Tiles have as many places, but those of an interval above 1 are not as many points.
+int MostPointsOf(BatchRun& run, const std::vector<GridTile>& tiles) {
+    std::size_t most = 0;
+    for (const GridTile& tile : tiles)
+        most = std::max(most, run.Series().PointsOf(tile).size());
+    return static_cast<int>(most);
+}
+
+/// Reads a tile that was made from the same, and holds just the active points of its part of the
+/// grid.
+bool ReadFittingTile(const BatchRun& run, const std::string& path, const std::string& fingerprint,
+                     const GridTile& part, ResultTile* tile) {
+    ResultTile read;
+    if (!ReadResultTile(path, fingerprint, static_cast<std::size_t>(run.Layout().Items()), &read))
+        return false;
+    std::vector<int> expected = run.PointsOf(part);
+    std::vector<int> found;
+    for (const ResultTile::Point& point : read.points)
+        found.push_back(point.number);
+    std::sort(expected.begin(), expected.end());
+    std::sort(found.begin(), found.end());
+    *tile = std::move(read);
+    return found == expected;
 }
 
 std::string FingerprintOf(BatchRun& run, const CRynEditDoc& document) {
@@ -62,6 +119,7 @@ class PartRun {
     }
     bool MakeDirectory();
     bool Stands(std::size_t index) const;
+    std::size_t BytesOf(const GridTile& group) const;
     bool RunTiles(std::size_t first, std::size_t end);
     bool RunGroup(const GridTile& group, std::size_t first, std::size_t end);
     void Print(int text, std::size_t index);
@@ -88,8 +146,8 @@ bool PartRun::MakeDirectory() {
 
 bool PartRun::Stands(std::size_t index) const {
     ResultTile tile;
-    return static_cast<bool>(ReadResultTile(TileName(run.Plan(), index, tiles.size()), fingerprint,
-                                            static_cast<std::size_t>(run.Layout().Items()), &tile));
+    return ReadFittingTile(run, TileName(run.Plan(), index, tiles.size()), fingerprint,
+                           tiles[index], &tile);
 }
 
 /// The part of the grid that two tiles cover together; nothing where they leave some of it out.
@@ -100,6 +158,13 @@ std::optional<GridTile> Joined(const GridTile& a, const GridTile& b) {
     both.countX = std::max(a.firstX + a.countX, b.firstX + b.countX) - both.firstX;
     both.countY = std::max(a.firstY + a.countY, b.firstY + b.countY) - both.firstY;
     return both.Points() == a.Points() + b.Points() ? std::optional(both) : std::nullopt;
+}
+
+/// Its values, and its results in memory and as text.
+std::size_t PartRun::BytesOf(const GridTile& group) const {
+    constexpr std::size_t kBytesOfResult = 64;
+    return group.Values() * sizeof(float) +
+           group.Points() * static_cast<std::size_t>(run.Layout().Items()) * kBytesOfResult;
 }
 
 // Tiles that are read in one go are run in one go, since a file is read in the longer runs the
@@ -117,7 +182,7 @@ bool PartRun::RunTiles(std::size_t first, std::size_t end) {
         std::size_t past = i + 1;
         for (; past < end && !Stands(past); ++past) {
             const std::optional<GridTile> both = Joined(group, tiles[past]);
-            if (!both || both->Values() * sizeof(float) > *memory / 4 * 3) // reading takes some too
+            if (!both || BytesOf(*both) > *memory / 4 * 3) // reading takes some too
                 break;
             group = *both;
         }
@@ -164,7 +229,7 @@ GridBatchOutcome PartRun::Execute() {
     fingerprint = FingerprintOf(run, owner);
     if (!PlanResultTiles(run, part.count, &tiles))
         return std::move(run.Outcome());
-    run.ExpectResultsOf(run.Plan().Points() / part.count + 1);
+    run.ExpectResultsOf(MostPointsOf(run, tiles));
     if (!MakeDirectory() || !run.ReadActivity())
         return std::move(run.Outcome());
     const auto count = static_cast<std::size_t>(part.count);
@@ -204,27 +269,19 @@ bool GridMerge::Prepare() {
 }
 
 void GridMerge::TakeTiles() {
-    const auto items = static_cast<std::size_t>(run.Layout().Items());
     for (std::size_t i = 0; i < tiles.size(); ++i) {
         const std::string name = TileName(run.Plan(), i, tiles.size());
         if (states[i] == TileState::Taken || !CanOpenForReading(name))
             continue;
         ResultTile tile;
-        const bool fits = ReadResultTile(name, fingerprint, items, &tile) && TakeTile(i, tile);
+        const bool fits = ReadFittingTile(run, name, fingerprint, tiles[i], &tile);
+        if (fits)
+            TakeTile(tile);
         states[i] = fits ? TileState::Taken : TileState::Unfit;
     }
 }
 
-/// False for a tile that does not hold just the tile's active points.
-bool GridMerge::TakeTile(std::size_t index, const ResultTile& tile) {
-    std::vector<int> expected = run.PointsOf(tiles[index]);
-    std::vector<int> found;
-    for (const ResultTile::Point& point : tile.points)
-        found.push_back(point.number);
-    std::sort(expected.begin(), expected.end());
-    std::sort(found.begin(), found.end());
-    if (found != expected)
-        return false;
+void GridMerge::TakeTile(const ResultTile& tile) {
     for (const ResultTile::Point& point : tile.points) {
         const GridPoint cell = run.OffsetsOf(point.number);
         grids->CopyRow(point.results, cell.x, cell.y);
@@ -234,7 +291,6 @@ bool GridMerge::TakeTile(std::size_t index, const ResultTile& tile) {
     counts.withMissing += tile.withMissing;
     counts.withFewerPeaks += tile.withFewerPeaks;
     counts.withMissingYears += tile.withMissingYears;
-    return true;
 }
 
 std::vector<std::string> GridMerge::TilesIn(TileState state) const {
@@ -246,12 +302,8 @@ std::vector<std::string> GridMerge::TilesIn(TileState state) const {
 }
 
 GridBatchOutcome GridMerge::Finish() {
-    if (run.LeaveLastFiles() && run.WriteOutput(*grids)) {
-        std::error_code error; // what cannot be removed does no harm
-        for (std::size_t i = 0; i < tiles.size(); ++i)
-            std::filesystem::remove(TileName(run.Plan(), i, tiles.size()), error);
-        std::filesystem::remove(TileDirectory(run.Plan()), error);
-    }
+    if (run.LeaveLastFiles() && run.WriteOutput(*grids))
+        RemoveTiles(TileDirectory(run.Plan()));
     return std::move(run.Outcome());
 }
 

@@ -42,12 +42,12 @@ class GridMerge {
     /// The tiles in a state, by the names of their files.
     std::vector<std::string> TilesIn(TileState state) const;
     /// With all tiles taken: leaves the files of the last point, writes the output, and removes the
-    /// tiles.
+    /// tiles, those of another number of parts too.
     GridBatchOutcome Finish();
     GridBatchOutcome& Outcome() { return run.Outcome(); }
 
   private:
-    bool TakeTile(std::size_t index, const ResultTile& tile);
+    void TakeTile(const ResultTile& tile);
 
     GridBatchOptions options;
     CRynEditDoc& document;

@@ -1,5 +1,6 @@
 #include "run/grid_plan.h"
 
+#include <algorithm>
 #include <climits>
 #include <cstdint>
 
@@ -37,6 +38,12 @@ Status First(std::initializer_list<Status> tests) {
     return Status::Ok();
 }
 
+/// The same places by a step that no sum of places and steps takes out of 32 bits.
+IndexRange Bounded(const IndexRange& range) {
+    const std::int64_t size = static_cast<std::int64_t>(range.last) - range.first + 1;
+    return {range.first, range.last, static_cast<int>(std::min<std::int64_t>(range.step, size))};
+}
+
 std::int64_t PlacesOf(const IndexRange& range) {
     return (static_cast<std::int64_t>(range.last) - range.first) / range.step + 1;
 }
@@ -59,8 +66,8 @@ Status MakeGridPlan(const CTsq2InputKvf& input, const std::string& baseDirectory
     plan->outputFile = FullPath(input.Tsq2OutputFile, baseDirectory);
     plan->title = input.Tsq2OutputFile;
     plan->item = input.Tsq2ItemNo;
-    plan->x = input.X_Range_And_Interval;
-    plan->y = input.Y_Range_And_Interval;
+    plan->x = Bounded(input.X_Range_And_Interval);
+    plan->y = Bounded(input.Y_Range_And_Interval);
     plan->firstStep = time.first;
     plan->lastStep = time.last;
     return Status::Ok();

@@ -5,6 +5,7 @@
 
 #include "base/path_parts.h"
 #include "results/result_file.h"
+#include "strings/catalogue.h"
 #include "tsq/tsq.h"
 
 namespace ryn {
@@ -14,6 +15,15 @@ namespace {
 std::string ParameterFileBeside(const std::string& path) {
     const PathParts parts = SplitPath(path);
     return parts.directory + parts.name + "Extract.RYN";
+}
+
+/// Whether a tree was saved for these files. Their names are drawn at random, so that no other
+/// batch has them.
+bool IsOf(const PointFiles& files, const KvfTree* tree) {
+    std::string series;
+    kvfGetParam(kvfSectionByNameNum(kvfTargetByNameNum(tree, "RynEditor", 1), "BasicInput", 1),
+                "InputFileName", &series, 1, 1);
+    return SplitPath(series).name == SplitPath(files.series).name;
 }
 
 } // namespace
@@ -69,8 +79,10 @@ Status PointAnalysis::Keep(const PointFiles& files) const {
                  : tsqCopyFile(files.extremes, files.kept);
 }
 
-// A file that cannot be read back is shown and the batch goes on: this point alone has failed.
-Status PointAnalysis::SaveAndLoad(KvfHandle* input, bool* isRead) {
+// A file that cannot be read back is shown and the batch goes on: this point alone has failed. One
+// that another batch over the same parameter file has put in its place would give this point that
+// one's numbers.
+Status PointAnalysis::SaveAndLoad(const PointFiles& files, KvfHandle* input, bool* isRead) {
     (void)document.TakeSaveError();
     document.OnSaveDocument(parameterFile);
     if (Status saved = document.TakeSaveError(); !saved)
@@ -83,7 +95,9 @@ Status PointAnalysis::SaveAndLoad(KvfHandle* input, bool* isRead) {
         kvfGetSyntaxErr(input->get(), nullptr, nullptr, &reason);
         document.GetPorts().messages->Show(MessageKind::Error, reason);
     }
-    return Status::Ok();
+    return !*isRead || IsOf(files, input->get())
+               ? Status::Ok()
+               : Status::SystemFault(FormatText(kTextGridPointFileReplaced, parameterFile));
 }
 
 /// The tree that a save would write and a load would give back, but for names of files, which stay
@@ -105,7 +119,7 @@ PointOutcome PointAnalysis::Run(const PointFiles& files, PointTrace trace) {
     KvfHandle input;
     bool isRead = true;
     if (outcome.reason && leavesFiles)
-        outcome.reason = SaveAndLoad(&input, &isRead);
+        outcome.reason = SaveAndLoad(files, &input, &isRead);
     else if (outcome.reason)
         input = MakeTree();
     if (!outcome.reason) {

@@ -21,7 +21,7 @@ enum class PointEnd {
     Good,        ///< the document holds the point's results
     Failed,      ///< status 1: this series cannot be analysed
     SetUpFailed, ///< status 3: no other point would fare better
-    Broken,      ///< one of its files could not be read or written
+    Broken,      ///< one of its files could not be read or written, or another process changed it
 };
 
 struct PointOutcome {
@@ -59,7 +59,7 @@ class PointAnalysis {
     void PointSections(const PointFiles& files);
     Status Extract(const PointFiles& files, bool* hasFewerPeaks);
     Status Keep(const PointFiles& files) const;
-    Status SaveAndLoad(KvfHandle* input, bool* isRead);
+    Status SaveAndLoad(const PointFiles& files, KvfHandle* input, bool* isRead);
     KvfHandle MakeTree();
 
     CRynEditDoc& document;

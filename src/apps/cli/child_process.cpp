@@ -15,9 +15,27 @@ namespace {
 
 constexpr int kCannotStart = 127; // what shells give
 
+/// Holds all signals back while it lives. One that came to a child before exec would be taken by
+/// the parent's handler there, and be lost: the child would never learn that it is to stop.
+class AllSignalsHeld {
+  public:
+    AllSignalsHeld() {
+        sigset_t all;
+        ::sigfillset(&all);
+        ::pthread_sigmask(SIG_SETMASK, &all, &before);
+    }
+    ~AllSignalsHeld() { Release(); }
+    AllSignalsHeld(const AllSignalsHeld&) = delete;
+    AllSignalsHeld& operator=(const AllSignalsHeld&) = delete;
+    void Release() const { ::pthread_sigmask(SIG_SETMASK, &before, nullptr); }
+
+  private:
+    sigset_t before{};
+};
+
 /// In the child, between fork and exec: nothing here may allocate.
 [[noreturn]] void Become(const char* program, char* const* arguments, int output, int errors,
-                         pid_t parent) {
+                         pid_t parent, const AllSignalsHeld& held) {
     ::dup2(output, STDOUT_FILENO);
     ::dup2(errors, STDERR_FILENO);
     ::prctl(PR_SET_PDEATHSIG, SIGTERM);
@@ -25,6 +43,7 @@ constexpr int kCannotStart = 127; // what shells give
         ::_exit(kCannotStart);
     for (const int signal : {SIGINT, SIGTERM, SIGHUP, SIGPIPE, SIGXFSZ})
         ::signal(signal, SIG_DFL);
+    held.Release();
     ::execv(program, arguments);
     ::_exit(kCannotStart);
 }
@@ -51,6 +70,17 @@ ChildProcess& ChildProcess::operator=(ChildProcess&& other) noexcept {
     return *this;
 }
 
+/// Gives the reason where there is no child.
+int ChildProcess::Fork(const char* program, char* const* arguments, int writeOutput,
+                       int writeErrors) {
+    const pid_t parent = ::getpid();
+    const AllSignalsHeld held;
+    pid = ::fork();
+    if (pid == 0)
+        Become(program, arguments, writeOutput, writeErrors, parent, held);
+    return pid < 0 ? errno : 0;
+}
+
 Status ChildProcess::Start(const std::string& program, const std::vector<std::string>& arguments) {
     std::vector<char*> pointers{const_cast<char*>(program.c_str())};
     for (const std::string& argument : arguments)
@@ -66,11 +96,7 @@ Status ChildProcess::Start(const std::string& program, const std::vector<std::st
         ::close(out[1]);
         return Status::FromErrno(program, reason);
     }
-    const pid_t parent = ::getpid();
-    pid = ::fork();
-    if (pid == 0)
-        Become(program.c_str(), pointers.data(), out[1], err[1], parent);
-    const int reason = errno;
+    const int reason = Fork(program.c_str(), pointers.data(), out[1], err[1]);
     ::close(out[1]);
     ::close(err[1]);
     output = out[0];

@@ -34,6 +34,7 @@ class ChildProcess {
     bool HasEnded(int* exitCode);
 
   private:
+    int Fork(const char* program, char* const* arguments, int writeOutput, int writeErrors);
     static bool Read(int* descriptor, std::string* text);
     void Close();
     /// `options` as waitpid takes them.

@@ -39,6 +39,10 @@ Status TestSettings(CaseFile& file) {
     // Written so that NaN, which a hand-edited file can hold, is refused too.
     if (basic.SelectionMethod == kSelectPartialDurations && !(basic.AvgAnNum > 0.0))
         return Status::InputFault(FormatText(kTextCliGridNoRate, file.ShownName()));
+    // The number of peaks is the rate times this, and none is no series.
+    if (basic.SelectionMethod == kSelectPartialDurations &&
+        basic.PdsDataType != kPartialDurationsByThreshold && !(basic.RecordLength > 0.0))
+        return Status::InputFault(FormatText(kTextCliGridNoRecordLength, file.ShownName()));
     const CTsq2InputKvf& input = file.Root().GridInput();
     return input.UseTsq2Input && !input.Tsq2InputFile.empty()
                ? TestReadable(FullPath(input.Tsq2InputFile, SplitPath(file.Path()).directory))

@@ -1,6 +1,8 @@
 #include "apps/cli/launcher.h"
 
+#include <algorithm>
 #include <array>
+#include <cstdint>
 #include <cstdlib>
 
 #include "base/number_text.h"
@@ -34,10 +36,11 @@ Status ReadNumber(const Environment& environment, const char* name, int* number)
     return Status::Ok();
 }
 
-Status Take(const char* name, int number, int parts, int* part) {
+/// 64 bits: a variable may hold any number, from which the first one is still taken away.
+Status Take(const char* name, std::int64_t number, int parts, int* part) {
     if (number < 1 || number > parts)
         return Status::InputFault(FormatText(kTextCliLauncherOutside, name, number, parts));
-    *part = number;
+    *part = static_cast<int>(number);
     return Status::Ok();
 }
 
@@ -51,7 +54,7 @@ Status TakeRank(const Environment& environment, const Launcher& launcher, int pa
             return read;
     if (count != parts)
         return Status::InputFault(FormatText(kTextCliLauncherCount, launcher.count, count, parts));
-    return Take(launcher.number, number - launcher.first + 1, parts, part);
+    return Take(launcher.number, std::int64_t{number} - launcher.first + 1, parts, part);
 }
 
 Status TakeArrayTask(const Environment& environment, int parts, int* part) {
@@ -72,7 +75,13 @@ Status TakeArrayTask(const Environment& environment, int parts, int* part) {
     if (environment("SLURM_ARRAY_TASK_STEP"))
         if (Status read = ReadNumber(environment, "SLURM_ARRAY_TASK_STEP", &step); !read)
             return read;
-    return Take(kId, (id - first) / (step > 0 ? step : 1) + 1, parts, part);
+    return Take(kId, (std::int64_t{id} - first) / std::max(step, 1) + 1, parts, part);
+}
+
+/// A process alone is no share: srun and mpirun set their variables for one process too, such as an
+/// array's task that runs the program under them.
+bool StartedOneOnly(const Environment& environment, const Launcher& launcher) {
+    return launcher.count != nullptr && environment(launcher.count) == "1";
 }
 
 } // namespace
@@ -86,13 +95,16 @@ Environment ProcessEnvironment() {
 
 Status PartOfLauncher(const Environment& environment, int parts, int* part) {
     for (const Launcher& launcher : kLaunchers)
-        if (environment(launcher.number))
+        if (environment(launcher.number) && (parts == 1 || !StartedOneOnly(environment, launcher)))
             return TakeRank(environment, launcher, parts, part);
     if (environment("SLURM_ARRAY_TASK_ID"))
         return TakeArrayTask(environment, parts, part);
     // Set in every job, so that it counts only where srun started as many processes.
     if (environment("SLURM_PROCID"))
         return TakeRank(environment, {"SLURM_PROCID", "SLURM_NTASKS", 0}, parts, part);
+    for (const Launcher& launcher : kLaunchers) // tells what does not fit
+        if (environment(launcher.number))
+            return TakeRank(environment, launcher, parts, part);
     return Status::InputFault(FormatText(kTextCliLauncherNone, parts));
 }
 

@@ -21,7 +21,8 @@ Environment ProcessEnvironment();
 ///
 /// Of a Slurm array the number within the array counts where the array is a whole one, whatever its
 /// first number is. A task that is submitted alone (--array=3) says nothing of the whole, so that
-/// its number is taken as it stands, from 1.
+/// its number is taken as it stands, from 1. mpirun with one process only says nothing where there
+/// are more parts and another launcher gives a number.
 Status PartOfLauncher(const Environment& environment, int parts, int* part);
 
 } // namespace ryn::cli

@@ -5,6 +5,7 @@
 
 #include "apps/cli/child_process.h"
 #include "apps/cli/exit_code.h"
+#include "strings/catalogue.h"
 
 namespace ryn::cli {
 
@@ -49,7 +50,7 @@ class Supervisor {
         job.process = ChildProcess();
         const Status started = job.process.Start(jobs.program, jobs.argumentsOf(job.part));
         if (!started)
-            Fail(job, kExitSystem, started.Text());
+            Fail(job, kExitSystem, started.Text() + "\n");
     }
 
     void Fail(const Job& job, int exitCode, const std::string& errors) {
@@ -95,7 +96,10 @@ class Supervisor {
 
     void TakeFailure(Job& job, int exitCode) {
         constexpr int kFirstOfSystem = 126; // cannot be started, or ended by a signal
+        constexpr int kBySignal = 128;
         const bool died = exitCode == kExitSystem || exitCode >= kFirstOfSystem;
+        if (exitCode > kBySignal)
+            job.errors += FormatText(kTextCliGridPartKilled, exitCode - kBySignal) + "\n";
         if (died && job.starts < 2 && end.part == 0 && !end.wasStopped)
             Start(job);
         else

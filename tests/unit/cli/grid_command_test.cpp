@@ -55,6 +55,9 @@ TEST_F(GridCommand, RefusesWhatWouldGoWrongAtTheFirstPoint) {
     ASSERT_EQ(Run({"set", "case.ryn", "DefineEVS.SelectionMethod=1"}), 0);
     EXPECT_EQ(Run({"grid", "case.ryn"}), 1);
     EXPECT_THAT(err, HasSubstr("BasicInput.AvgAnNum above 0"));
+    ASSERT_EQ(Run({"set", "case.ryn", "BasicInput.AvgAnNum=2", "BasicInput.PdsDataType=1"}), 0);
+    EXPECT_EQ(Run({"grid", "case.ryn"}), 1);
+    EXPECT_THAT(err, HasSubstr("BasicInput.RecordLength above 0"));
     ASSERT_EQ(Run({"set", "case.ryn", "Tsq2Input.UseTsq2Input=false",
                    "BasicInput.SelectionMethod=0", "DefineEVS.SelectionMethod=0"}),
               0);

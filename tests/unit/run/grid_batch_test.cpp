@@ -1,5 +1,6 @@
 #include "run/grid_batch.h"
 
+#include <climits>
 #include <filesystem>
 #include <set>
 #include <sys/resource.h>
@@ -93,6 +94,30 @@ TEST(GridBatch, LeavesTheSameOnDiskAndInMemory) {
     EXPECT_EQ(NamesIn(batch.directory.Root() / "ExtremeValueSeries").size(), 5U);
     EXPECT_THAT(batch.directory.Read("caseExtract.RYN"), HasSubstr("RYNTsq0_5_"));
     EXPECT_TRUE(batch.ports.messages.empty());
+}
+
+// The result file is written before a point is run, so that a first good point leaves the old one.
+TEST(GridBatch, LeavesTheResultsBeforeTheLastPointWhereOnlyThatIsGood) {
+    SampleHistory history;
+    const auto good = history.value;
+    history.value = [good](int x, int y, int step) {
+        return x == 2 && y == 1 ? good(x, y, step) : 7.0;
+    };
+    SampleBatch batch(history);
+    const auto& directory = batch.directory;
+    ASSERT_EQ(batch.Run(Scratch::Disk).end, BatchEnd::Written);
+    EXPECT_FALSE(directory.Has("case.res"));
+    ASSERT_EQ(batch.Run(Scratch::Memory).end, BatchEnd::Written);
+    EXPECT_FALSE(directory.Has("case.res"));
+
+    SampleHistory().Write(directory.Path("grid.nc"));
+    ASSERT_EQ(batch.Run(Scratch::Memory).end, BatchEnd::Written);
+    const std::string before = directory.Read("case.res");
+    history.Write(directory.Path("grid.nc"));
+    for (const Scratch scratch : {Scratch::Disk, Scratch::Memory}) {
+        ASSERT_EQ(batch.Run(scratch).end, BatchEnd::Written);
+        EXPECT_EQ(directory.Read("case.res"), before);
+    }
 }
 
 TEST(GridBatch, NamesItemsAndLeavesHolesWhereNoPointIsGood) {
@@ -216,6 +241,20 @@ TEST(GridBatch, StepsOverPointsAndKeepsTheirCells) {
     }
 }
 
+TEST(GridBatch, TakesOnePointWhereTheStepIsBeyondTheRange) {
+    SampleBatch batch;
+    batch.Edit([](CGlobalKvf& root) {
+        root.GridInput().X_Range_And_Interval = {1, 2, INT_MAX};
+        root.GridInput().Y_Range_And_Interval = {1, 1, INT_MAX};
+    });
+    for (const Scratch scratch : {Scratch::Disk, Scratch::Memory}) {
+        const GridBatchOutcome outcome = batch.Run(scratch);
+        ASSERT_EQ(outcome.end, BatchEnd::Written) << outcome.reason.Text();
+        EXPECT_EQ(outcome.counts.computed, 1);
+        EXPECT_EQ(ResultFile(batch.directory.Path("out.nc")).header.SizeX(), 2);
+    }
+}
+
 TEST(GridBatch, RefusesWhatCannotBeRunWithOneLine) {
     struct Refusal {
         std::function<void(CTsq2InputKvf&)> change;
@@ -255,6 +294,13 @@ TEST(GridBatch, RefusesWhatCannotBeRunWithOneLine) {
             EXPECT_EQ(batch.printed, "");
             EXPECT_EQ(batch.directory.EntryCount(), 2U);
         }
+    }
+    for (const char* const own : {"grid.nc", "case.RYN"}) {
+        SampleBatch linked;
+        const std::string before = linked.directory.Read(own);
+        std::filesystem::create_symlink(own, linked.directory.Path("caseExtract.RYN"));
+        EXPECT_EQ(linked.Run(Scratch::Disk).end, BatchEnd::Refused);
+        EXPECT_EQ(linked.directory.Read(own), before);
     }
     SampleBatch unused;
     unused.Edit([](CGlobalKvf& root) { root.GridInput().UseTsq2Input = false; });
