@@ -236,18 +236,26 @@ void BatchRun::KeepIfNeeded(int point) {
         series.KeepHistory(point);
 }
 
-bool BatchRun::RunPart(const GridTile& part, const TakeResults& take) {
+bool BatchRun::RunParts(const GridTile& whole, const std::vector<GridTile>& parts,
+                        const TakeResults& take,
+                        const std::function<bool(std::size_t part)>& endPart) {
     const std::optional<std::size_t> memory = MemoryForTile();
     if (!memory)
         return false;
     ScratchFiles scratch = MakeScratch();
     bool goesOn = true;
-    Status read =
-        series.ForEachPoint(part, *memory, active, scratch, [&](int point, CTsq0FileInfo& files) {
-            goesOn = RunPoint(point, files, take);
-            return goesOn ? Next::GoOn : Next::Stop;
-        });
-    outcome.counts.withMissing = series.SeriesWithMissing();
+    const auto orStop = [&goesOn](bool good) {
+        goesOn = good;
+        return good ? Next::GoOn : Next::Stop;
+    };
+    PointSeries::Visit visit;
+    visit.use = [&](int point, CTsq0FileInfo& files) {
+        const bool good = RunPoint(point, files, take);
+        outcome.counts.withMissing = series.SeriesWithMissing();
+        return orStop(good);
+    };
+    visit.endPart = [&](std::size_t part) { return orStop(endPart(part)); };
+    Status read = series.ForEachPoint(whole, parts, *memory, active, scratch, visit);
     return read ? goesOn : Fail(std::move(read));
 }
 

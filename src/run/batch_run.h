@@ -53,8 +53,11 @@ class BatchRun {
     /// The active points of a part of the grid, by number.
     std::vector<int> PointsOf(const GridTile& part) const;
 
-    /// Runs the active points of a part of the grid over series in memory.
-    bool RunPart(const GridTile& part, const TakeResults& take);
+    /// Runs the active points of parts of the grid, which make up the rectangle `whole`, over
+    /// series in memory; `endPart` is told when a part is done, counted from 0, and gives false
+    /// where the batch ends.
+    bool RunParts(const GridTile& whole, const std::vector<GridTile>& parts,
+                  const TakeResults& take, const std::function<bool(std::size_t part)>& endPart);
     /// Runs one point over its series, with the files that it leaves behind.
     bool RunPoint(int point, CTsq0FileInfo& series, const TakeResults& take);
     /// Takes over what was found of a point elsewhere.

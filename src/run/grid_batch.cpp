@@ -109,7 +109,9 @@ bool GridBatch::ComputeInMemory() {
     if (options.print)
         run.PrintCreatedLines();
     MakeGrids();
-    return run.RunPart(run.Plan().Whole(), IntoGrids()) && run.LeaveLastFiles();
+    return run.RunParts(run.Plan().Whole(), {run.Plan().Whole()}, IntoGrids(),
+                        [](std::size_t /*part*/) { return true; }) &&
+           run.LeaveLastFiles();
 }
 
 void PrintOnStandardOutput(const std::string& line) {

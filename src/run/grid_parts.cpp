@@ -112,6 +112,8 @@ class PartRun {
     GridBatchOutcome Execute();
 
   private:
+    using GoodResults = std::map<int, std::vector<float>>; // by number of the point
+
     /// The lines of the computation count points over the whole grid.
     static GridBatchOptions WithoutLines(GridBatchOptions wanted) {
         wanted.print = {};
@@ -119,9 +121,9 @@ class PartRun {
     }
     bool MakeDirectory();
     bool Stands(std::size_t index) const;
-    std::size_t BytesOf(const GridTile& group) const;
     bool RunTiles(std::size_t first, std::size_t end);
     bool RunGroup(const GridTile& group, std::size_t first, std::size_t end);
+    bool Write(std::size_t index, const GoodResults& good);
     void Print(int text, std::size_t index);
 
     GridBatchOptions options;
@@ -131,6 +133,7 @@ class PartRun {
     CRynEditDoc& owner;
     std::string fingerprint;
     std::vector<GridTile> tiles;
+    BatchCounts told; ///< of the points in the tiles written so far
 };
 
 void PartRun::Print(int text, std::size_t index) {
@@ -160,13 +163,6 @@ std::optional<GridTile> Joined(const GridTile& a, const GridTile& b) {
     return both.Points() == a.Points() + b.Points() ? std::optional(both) : std::nullopt;
 }
 
-/// Its values, and its results in memory and as text.
-std::size_t PartRun::BytesOf(const GridTile& group) const {
-    constexpr std::size_t kBytesOfResult = 64;
-    return group.Values() * sizeof(float) +
-           group.Points() * static_cast<std::size_t>(run.Layout().Items()) * kBytesOfResult;
-}
-
 // Tiles that are read in one go are run in one go, since a file is read in the longer runs the
 // larger the part of it is.
 bool PartRun::RunTiles(std::size_t first, std::size_t end) {
@@ -182,7 +178,7 @@ bool PartRun::RunTiles(std::size_t first, std::size_t end) {
         std::size_t past = i + 1;
         for (; past < end && !Stands(past); ++past) {
             const std::optional<GridTile> both = Joined(group, tiles[past]);
-            if (!both || BytesOf(*both) > *memory / 4 * 3) // reading takes some too
+            if (!both || both->Values() * sizeof(float) > *memory / 4 * 3) // reading takes some too
                 break;
             group = *both;
         }
@@ -193,33 +189,32 @@ bool PartRun::RunTiles(std::size_t first, std::size_t end) {
     return true;
 }
 
+// A tile is written when its points are done, so that a part that is killed has lost that one only.
 bool PartRun::RunGroup(const GridTile& group, std::size_t first, std::size_t end) {
-    std::map<int, std::vector<float>> good;
-    const BatchCounts before = run.Outcome().counts;
-    if (!run.RunPart(group, [&good](int point, const std::vector<float>& results) {
-            good.emplace(point, results);
-        }))
-        return false;
-    // What was found besides is counted once, with the first of the tiles.
-    BatchCounts found = run.Outcome().counts;
-    found.withMissing -= before.withMissing;
-    found.withFewerPeaks -= before.withFewerPeaks;
-    found.withMissingYears -= before.withMissingYears;
-    for (std::size_t i = first; i < end; ++i) {
-        ResultTile tile;
-        tile.fingerprint = fingerprint;
-        tile.withMissing = i == first ? found.withMissing : 0;
-        tile.withFewerPeaks = i == first ? found.withFewerPeaks : 0;
-        tile.withMissingYears = i == first ? found.withMissingYears : 0;
-        for (const int point : run.PointsOf(tiles[i])) {
-            const auto results = good.find(point);
-            const bool isGood = results != good.end();
-            tile.points.push_back({point, isGood, isGood ? results->second : std::vector<float>()});
-        }
-        if (Status written = WriteResultTile(tile, TileName(run.Plan(), i, tiles.size())); !written)
-            return run.Fail(std::move(written));
-        Print(kTextGridTileWritten, i);
+    const std::vector<GridTile> parts(tiles.begin() + static_cast<std::ptrdiff_t>(first),
+                                      tiles.begin() + static_cast<std::ptrdiff_t>(end));
+    GoodResults good;
+    return run.RunParts(
+        group, parts,
+        [&good](int point, const std::vector<float>& results) { good.emplace(point, results); },
+        [&](std::size_t index) { return Write(first + index, std::exchange(good, {})); });
+}
+
+bool PartRun::Write(std::size_t index, const GoodResults& good) {
+    const BatchCounts before = std::exchange(told, run.Outcome().counts);
+    ResultTile tile;
+    tile.fingerprint = fingerprint;
+    tile.withMissing = told.withMissing - before.withMissing;
+    tile.withFewerPeaks = told.withFewerPeaks - before.withFewerPeaks;
+    tile.withMissingYears = told.withMissingYears - before.withMissingYears;
+    for (const int point : run.PointsOf(tiles[index])) {
+        const auto results = good.find(point);
+        const bool isGood = results != good.end();
+        tile.points.push_back({point, isGood, isGood ? results->second : std::vector<float>()});
     }
+    if (Status written = WriteResultTile(tile, TileName(run.Plan(), index, tiles.size())); !written)
+        return run.Fail(std::move(written));
+    Print(kTextGridTileWritten, index);
     return true;
 }
 

@@ -13,15 +13,28 @@ namespace ryn {
 
 namespace {
 
-/// The points of a tile, in point order.
+/// The cells that a tile and a part of the grid have in common.
+GridTile Common(const GridTile& tile, const GridTile& part) {
+    GridTile common = tile;
+    common.firstX = std::max(tile.firstX, part.firstX);
+    common.firstY = std::max(tile.firstY, part.firstY);
+    common.countX =
+        std::max(0, std::min(tile.firstX + tile.countX, part.firstX + part.countX) - common.firstX);
+    common.countY =
+        std::max(0, std::min(tile.firstY + tile.countY, part.firstY + part.countY) - common.firstY);
+    return common;
+}
+
+/// The points of a tile that lie in a part of the grid, in point order, with the offset of their
+/// history in the tile.
 template <typename Use>
-Next ForEachPlace(const GridPlan& plan, const GridTile& tile, Use use) {
+Next ForEachPlace(const GridPlan& plan, const GridTile& tile, const GridTile& part, Use use) {
     const auto firstFrom = [](const IndexRange& range, int place) {
         return range.first + (place - range.first + range.step - 1) / range.step * range.step;
     };
-    for (int x = firstFrom(plan.x, tile.firstX); x < tile.firstX + tile.countX; x += plan.x.step)
-        for (int y = firstFrom(plan.y, tile.firstY); y < tile.firstY + tile.countY;
-             y += plan.y.step) {
+    const GridTile in = Common(tile, part);
+    for (int x = firstFrom(plan.x, in.firstX); x < in.firstX + in.countX; x += plan.x.step)
+        for (int y = firstFrom(plan.y, in.firstY); y < in.firstY + in.countY; y += plan.y.step) {
             const int point = (x - plan.x.first) / plan.x.step * plan.PointsY() +
                               (y - plan.y.first) / plan.y.step;
             const std::size_t place =
@@ -71,7 +84,7 @@ Status PointSeries::Divide(int pieces, std::vector<GridTile>* tiles) {
 
 std::vector<int> PointSeries::PointsOf(const GridTile& part) const {
     std::vector<int> points;
-    ForEachPlace(plan, part, [&points](int point, std::size_t /*offset*/) {
+    ForEachPlace(plan, part, part, [&points](int point, std::size_t /*offset*/) {
         points.push_back(point);
         return Next::GoOn;
     });
@@ -96,7 +109,7 @@ Status PointSeries::ReadActivity(std::size_t memory, std::vector<bool>* active) 
         values.resize(tile.Values());
         if (engine.ReadTile(tile, memory, values) != kGridOk)
             return engine.LastError();
-        ForEachPlace(plan, tile, [&](int point, std::size_t offset) {
+        ForEachPlace(plan, tile, tile, [&](int point, std::size_t offset) {
             (*active)[static_cast<std::size_t>(point)] = values[offset] != header.DeleteValue();
             return Next::GoOn;
         });
@@ -113,32 +126,48 @@ Status PointSeries::MakeOne(CTsq0FileInfo& series, int point, const float* value
     return good ? Status::Ok() : StoreError(series);
 }
 
-Status
-PointSeries::ForEachPoint(const GridTile& part, std::size_t memory, const std::vector<bool>& active,
-                          ScratchFiles& scratch,
-                          const std::function<Next(int point, CTsq0FileInfo& series)>& use) try {
+Status PointSeries::VisitPoint(int point, const float* values, ScratchFiles& scratch,
+                               const Visit& visit, Next* next) {
+    CTsq0FileInfo files(scratch);
+    const GridPoint place = plan.PointAt(point);
+    files.SetPosition(place.x, place.y);
+    history = values;
+    const std::span<const float> whole(history, static_cast<std::size_t>(plan.Steps()));
+    withMissing += std::ranges::find(whole, header.DeleteValue()) != whole.end() ? 1 : 0;
+    Status made = MakeOne(files, point, history);
+    *next = made ? visit.use(point, files) : Next::Stop;
+    return made;
+}
+
+Status PointSeries::ForEachPoint(const GridTile& whole, const std::vector<GridTile>& parts,
+                                 std::size_t memory, const std::vector<bool>& active,
+                                 ScratchFiles& scratch, const Visit& visit) try {
     std::vector<GridTile> tiles;
-    if (engine.PlanTiles(part, memory, &tiles) != kGridOk)
+    if (engine.PlanTiles(whole, memory, &tiles) != kGridOk)
         return engine.LastError();
+    std::vector<std::size_t> left; // cells of each part that are not done
+    for (const GridTile& part : parts)
+        left.push_back(part.Points());
     for (const GridTile& tile : tiles) {
         tileValues.resize(tile.Values());
         if (engine.ReadTile(tile, memory, tileValues) != kGridOk)
             return engine.LastError();
-        Status made;
-        const Next next = ForEachPlace(plan, tile, [&](int point, std::size_t offset) {
-            if (!active[static_cast<std::size_t>(point)])
-                return Next::GoOn;
-            CTsq0FileInfo series(scratch);
-            const GridPoint place = plan.PointAt(point);
-            series.SetPosition(place.x, place.y);
-            history = tileValues.data() + offset;
-            const std::span<const float> whole(history, static_cast<std::size_t>(plan.Steps()));
-            withMissing += std::ranges::find(whole, header.DeleteValue()) != whole.end() ? 1 : 0;
-            made = MakeOne(series, point, history);
-            return made ? use(point, series) : Next::Stop;
-        });
-        if (next == Next::Stop)
-            return made;
+        for (std::size_t i = 0; i < parts.size(); ++i) {
+            Status made;
+            Next next = ForEachPlace(plan, tile, parts[i], [&](int point, std::size_t offset) {
+                if (!active[static_cast<std::size_t>(point)])
+                    return Next::GoOn;
+                Next afterwards = Next::GoOn;
+                made = VisitPoint(point, tileValues.data() + offset, scratch, visit, &afterwards);
+                return afterwards;
+            });
+            const std::size_t cells = Common(tile, parts[i]).Points();
+            left[i] -= cells;
+            if (next == Next::GoOn && cells > 0 && left[i] == 0 && visit.endPart)
+                next = visit.endPart(i);
+            if (next == Next::Stop)
+                return made;
+        }
     }
     return Status::Ok();
 } catch (const std::bad_alloc&) {
@@ -178,7 +207,7 @@ Status PointSeries::ReadHistories(const std::vector<int>& points, std::size_t me
         values.resize(part.Values());
         if (engine.ReadTile(part, memory, values) != kGridOk)
             return engine.LastError();
-        ForEachPlace(plan, part, [&](int point, std::size_t offset) {
+        ForEachPlace(plan, part, part, [&](int point, std::size_t offset) {
             history = values.data() + offset;
             if (std::ranges::find(points, point) != points.end())
                 KeepHistory(point);

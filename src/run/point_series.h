@@ -45,12 +45,18 @@ class PointSeries {
     /// Which points take part, by number. Reads the first step, in parts of `memory` bytes.
     Status ReadActivity(std::size_t memory, std::vector<bool>* active);
 
-    /// Calls `use` with the number and the series of each active point of a part of the grid. One
-    /// series exists at a time. The part is read in tiles of at most `memory` bytes, tile by tile
-    /// and each in point order.
-    Status ForEachPoint(const GridTile& part, std::size_t memory, const std::vector<bool>& active,
-                        ScratchFiles& scratch,
-                        const std::function<Next(int point, CTsq0FileInfo& series)>& use);
+    /// What to do with the points of parts of the grid.
+    struct Visit {
+        /// With each active point's number and series. One series exists at a time.
+        std::function<Next(int point, CTsq0FileInfo& series)> use;
+        /// When all points of a part, counted from 0, are done; may be empty.
+        std::function<Next(std::size_t part)> endPart;
+    };
+    /// Visits parts of the grid that make up the rectangle `whole`. It is read in tiles of at most
+    /// `memory` bytes; within a tile go the parts one after the other, each in point order.
+    Status ForEachPoint(const GridTile& whole, const std::vector<GridTile>& parts,
+                        std::size_t memory, const std::vector<bool>& active, ScratchFiles& scratch,
+                        const Visit& visit);
 
     /// Within `use`: keeps the history of that point, so that it need not be read again.
     void KeepHistory(int point);
@@ -70,6 +76,8 @@ class PointSeries {
   private:
     Status ReadHistories(const std::vector<int>& points, std::size_t memory);
     Status MakeOne(CTsq0FileInfo& series, int point, const float* values);
+    Status VisitPoint(int point, const float* values, ScratchFiles& scratch, const Visit& visit,
+                      Next* next);
     Status BeginAll(std::vector<CTsq0FileInfo>& points, int first, int end,
                     const CQxArray2D<float>& plane);
     Status EndAll(std::vector<CTsq0FileInfo>& points, int first, int end);

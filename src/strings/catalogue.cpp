@@ -298,7 +298,7 @@ constexpr std::array kEntries = std::to_array<Entry>({
     {kTextCliGridPartOutside, "there is no part %d of %d",
      "%d 番目の部分はありません（分割数 %d）"},
     {kTextCliGridPartFailed, "part %d of %d failed:", "%d / %d 番目の部分が失敗しました:"},
-    {kTextCliGridPartKilled, "it was ended by signal %d", "シグナル %d により終了しました"},
+    {kTextCliGridPartKilled, "ended by signal %d (%s)", "シグナル %d で終了しました（%s）"},
     {kTextCliGridJobsAlone, "--jobs goes without --parts, --part and --merge",
      "--jobs は --parts、--part、--merge と同時に指定できません"},
     {kTextCliLauncherNoNumber, "%s is \"%s\", which is no number",
@@ -307,6 +307,13 @@ constexpr std::array kEntries = std::to_array<Entry>({
      "%s によればこの部分は %d 番ですが、部分は 1 から %d です"},
     {kTextCliLauncherCount, "%s is %d, and --parts is %d; they must be the same",
      "%s は %d、--parts は %d です。同じでなければなりません"},
+    {kTextCliLauncherLoneTask,
+     "%s is %d in an array that is not of all parts, where tasks are numbered as the parts are; "
+     "use numbers of --array=1-%d, or give --part",
+     "%s の値 %d は全部分の配列に属さないため、部分の番号とみなします。--array=1-%d "
+     "の番号を使うか、--part を指定してください"},
+    {kTextCliLauncherDisagree, "%s makes this part %d, and %s makes it part %d; give --part",
+     "%s によればこの部分は %d 番、%s によれば %d 番です。--part を指定してください"},
     {kTextCliLauncherNone,
      "--parts %d without --part, and no launcher gives this process a number; give --part, --merge "
      "or --jobs",

@@ -185,6 +185,8 @@ enum TextId : int {
     kTextCliLauncherNoNumber,
     kTextCliLauncherOutside,
     kTextCliLauncherCount,
+    kTextCliLauncherLoneTask,
+    kTextCliLauncherDisagree,
     kTextCliLauncherNone,
     kTextCliAnnualMaxima,
     kTextCliPartialDurations,

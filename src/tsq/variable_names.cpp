@@ -37,8 +37,10 @@ std::string VariableNames::For(std::string_view itemName, std::size_t number) {
     else if (!IsLetter(base.front()))
         base = "item_" + base;
     std::string name = base;
-    for (std::size_t next = 2; !used.insert(name).second; ++next)
-        name = base + "_" + std::to_string(next);
+    // Counted on, since thousands of items may differ only behind the bytes that are kept.
+    for (std::size_t& last = lastNumber.try_emplace(base, 1).first->second;
+         !used.insert(name).second;)
+        name = base + "_" + std::to_string(++last);
     return name;
 }
 

@@ -1,8 +1,10 @@
 #pragma once
 
+#include <cstddef>
 #include <set>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 
 namespace ryn {
 
@@ -17,6 +19,7 @@ class VariableNames {
 
   private:
     std::set<std::string> used;
+    std::unordered_map<std::string, std::size_t> lastNumber; // of items that make the same name
 };
 
 } // namespace ryn

@@ -8,6 +8,7 @@ import tempfile
 import time
 
 CPUS = 4  # more than the machine may have: tasks shall run side by side
+COMMAND_SECONDS = 60  # for sinfo and its like, which wait long for a controller that hangs
 
 CONFIGURATION = """
 ClusterName=test
@@ -60,13 +61,15 @@ class LocalSlurm:
         self.daemons = []
         try:
             self._start()
-        except BaseException:
-            self._tell_logs()
-            self.__exit__()
+        except BaseException as fault:
+            self.__exit__(type(fault))
             raise
         return self
 
-    def __exit__(self, *_):
+    def __exit__(self, fault=None, *_):
+        if fault:
+            self._tell_logs()
+        self._end_jobs()
         for daemon in reversed(self.daemons):
             daemon.terminate()
         for daemon in self.daemons:
@@ -76,6 +79,16 @@ class LocalSlurm:
                 daemon.kill()
                 daemon.wait()
         shutil.rmtree(self.state, ignore_errors=True)
+
+    def _end_jobs(self):
+        """Tasks have a process of Slurm's each, which would outlive the daemons."""
+        if len(self.daemons) < 3 or any(daemon.poll() is not None for daemon in self.daemons):
+            return
+        self.output("scancel", "--user=root", "--signal=KILL", "--full")
+        self.output("scancel", "--user=root")
+        end = time.monotonic() + 15
+        while self.output("squeue", "-h").strip() and time.monotonic() < end:
+            time.sleep(0.2)
 
     def _start(self):
         for name in ["controller", "node"]:
@@ -118,13 +131,15 @@ class LocalSlurm:
 
     def output(self, *command):
         return subprocess.run(command, env=self.environment, stdout=subprocess.PIPE,
-                              stderr=subprocess.STDOUT, text=True, check=False).stdout
+                              stderr=subprocess.STDOUT, text=True, check=False,
+                              timeout=COMMAND_SECONDS).stdout
 
     def submit(self, directory, script, *options):
         """The number of the job."""
         result = subprocess.run(
             ["sbatch", "--parsable", "-D", str(directory), "-o", "task-%a.out", *options, "--wrap",
-             script], env=self.environment, stdout=subprocess.PIPE, text=True, check=True)
+             script], env=self.environment, stdout=subprocess.PIPE, text=True, check=True,
+            timeout=COMMAND_SECONDS)
         return result.stdout.strip()
 
     def wait_for_end(self, job, seconds=120):

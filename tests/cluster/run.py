@@ -7,6 +7,7 @@ usage: run.py PROGRAM_DIRECTORY
 import os
 import pathlib
 import shutil
+import signal
 import subprocess
 import sys
 import tempfile
@@ -15,6 +16,7 @@ import time
 from local_slurm import LocalSlurm
 
 PARTS = 4
+SECONDS = 300  # for a whole run of the program, which takes some ten
 GRID = pathlib.Path(__file__).resolve().parents[1] / "acceptance/grid-in-jobs/input/waves.nc"
 
 
@@ -34,7 +36,7 @@ class Batch:
 
     def ryn(self, *arguments):
         subprocess.run([self.program, *arguments], cwd=self.directory, check=True,
-                       stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
+                       timeout=SECONDS, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
 
     def tiles(self):
         return sorted(path.name for path in self.directory.glob("out.nc.tiles/*of*"))
@@ -75,7 +77,7 @@ def run_mpirun(batch):
     environment = dict(os.environ, OMPI_ALLOW_RUN_AS_ROOT="1", OMPI_ALLOW_RUN_AS_ROOT_CONFIRM="1")
     subprocess.run(["mpirun", "-n", str(PARTS), "--oversubscribe", batch.program, "grid",
                     "case.ryn", "--parts", str(PARTS)], cwd=batch.directory, env=environment,
-                   check=True, stdout=subprocess.DEVNULL)
+                   check=True, timeout=SECONDS, stdout=subprocess.DEVNULL)
     batch.merge("mpirun")
 
 
@@ -83,11 +85,13 @@ def run_parallel(batch):
     environment = dict(os.environ, HOME=str(batch.directory))  # where it keeps its notice
     subprocess.run(["parallel", "--will-cite", "-j2", f"{batch.program} grid case.ryn --parts "
                     f"{PARTS} # {{}}", ":::", *map(str, range(PARTS))], cwd=batch.directory,
-                   env=environment, check=True, stdout=subprocess.DEVNULL)
+                   env=environment, check=True, timeout=SECONDS, stdout=subprocess.DEVNULL)
     batch.merge("GNU parallel")
 
 
 def main():
+    # So that the daemons end with it.
+    signal.signal(signal.SIGTERM, lambda *_: sys.exit("stopped"))
     program = str(pathlib.Path(sys.argv[1]).resolve() / "ryn")
     root = pathlib.Path(tempfile.mkdtemp(prefix="ryn-cluster-"))
     try:

@@ -3,6 +3,7 @@
 #include <array>
 #include <cerrno>
 #include <csignal>
+#include <cstring>
 #include <fcntl.h>
 #include <sys/prctl.h>
 #include <sys/wait.h>
@@ -15,37 +16,61 @@ namespace {
 
 constexpr int kCannotStart = 127; // what shells give
 
-/// Holds all signals back while it lives. One that came to a child before exec would be taken by
-/// the parent's handler there, and be lost: the child would never learn that it is to stop.
-class AllSignalsHeld {
-  public:
-    AllSignalsHeld() {
-        sigset_t all;
-        ::sigfillset(&all);
-        ::pthread_sigmask(SIG_SETMASK, &all, &before);
-    }
-    ~AllSignalsHeld() { Release(); }
-    AllSignalsHeld(const AllSignalsHeld&) = delete;
-    AllSignalsHeld& operator=(const AllSignalsHeld&) = delete;
-    void Release() const { ::pthread_sigmask(SIG_SETMASK, &before, nullptr); }
+/// "ryn: PROGRAM: REASON" on standard error.
+void TellReason(const char* program, int error) {
+    for (const char* const piece : {"ryn: ", program, ": ", ::strerrordesc_np(error), "\n"})
+        if (::write(STDERR_FILENO, piece, std::strlen(piece)) < 0)
+            return;
+}
 
-  private:
-    sigset_t before{};
+/// This process's handlers, which a signal that comes before exec would run, go. What is ignored
+/// stays so, as under nohup; but SIGPIPE and SIGXFSZ are ignored by this program's own doing.
+void ResetSignals(const sigset_t& mask) {
+    for (const int signal : {SIGINT, SIGTERM, SIGHUP}) {
+        struct sigaction found {};
+        if (::sigaction(signal, nullptr, &found) == 0 && found.sa_handler != SIG_IGN)
+            ::signal(signal, SIG_DFL);
+    }
+    for (const int signal : {SIGPIPE, SIGXFSZ})
+        ::signal(signal, SIG_DFL);
+    ::sigprocmask(SIG_SETMASK, &mask, nullptr);
+}
+
+/// What the child needs between fork and exec, where nothing may allocate.
+struct Beginning {
+    const char* program;
+    char* const* arguments;
+    int output;
+    int errors;
+    pid_t parent;
+    sigset_t mask; ///< of signals, as the parent had it before it held them back
 };
 
-/// In the child, between fork and exec: nothing here may allocate.
-[[noreturn]] void Become(const char* program, char* const* arguments, int output, int errors,
-                         pid_t parent, const AllSignalsHeld& held) {
-    ::dup2(output, STDOUT_FILENO);
-    ::dup2(errors, STDERR_FILENO);
+[[noreturn]] void Become(const Beginning& beginning) {
+    ::dup2(beginning.output, STDOUT_FILENO);
+    ::dup2(beginning.errors, STDERR_FILENO);
     ::prctl(PR_SET_PDEATHSIG, SIGTERM);
-    if (::getppid() != parent) // it died before that was set
+    if (::getppid() != beginning.parent) // it died before that was set
         ::_exit(kCannotStart);
-    for (const int signal : {SIGINT, SIGTERM, SIGHUP, SIGPIPE, SIGXFSZ})
-        ::signal(signal, SIG_DFL);
-    held.Release();
-    ::execv(program, arguments);
+    ResetSignals(beginning.mask);
+    ::execv(beginning.program, beginning.arguments);
+    TellReason(beginning.program, errno);
     ::_exit(kCannotStart);
+}
+
+/// Holds all signals back until the child has put away the handlers that it has from here: one that
+/// asks it to stop would be lost in them.
+pid_t Fork(Beginning& beginning) {
+    sigset_t all;
+    ::sigfillset(&all);
+    ::pthread_sigmask(SIG_SETMASK, &all, &beginning.mask);
+    const pid_t pid = ::fork();
+    if (pid == 0)
+        Become(beginning);
+    const int reason = errno;
+    ::pthread_sigmask(SIG_SETMASK, &beginning.mask, nullptr);
+    errno = reason;
+    return pid;
 }
 
 } // namespace
@@ -70,17 +95,6 @@ ChildProcess& ChildProcess::operator=(ChildProcess&& other) noexcept {
     return *this;
 }
 
-/// Gives the reason where there is no child.
-int ChildProcess::Fork(const char* program, char* const* arguments, int writeOutput,
-                       int writeErrors) {
-    const pid_t parent = ::getpid();
-    const AllSignalsHeld held;
-    pid = ::fork();
-    if (pid == 0)
-        Become(program, arguments, writeOutput, writeErrors, parent, held);
-    return pid < 0 ? errno : 0;
-}
-
 Status ChildProcess::Start(const std::string& program, const std::vector<std::string>& arguments) {
     std::vector<char*> pointers{const_cast<char*>(program.c_str())};
     for (const std::string& argument : arguments)
@@ -96,7 +110,11 @@ Status ChildProcess::Start(const std::string& program, const std::vector<std::st
         ::close(out[1]);
         return Status::FromErrno(program, reason);
     }
-    const int reason = Fork(program.c_str(), pointers.data(), out[1], err[1]);
+    // A caller may have left it ignored; then no child would tell how it ended.
+    ::signal(SIGCHLD, SIG_DFL);
+    Beginning beginning{program.c_str(), pointers.data(), out[1], err[1], ::getpid(), {}};
+    pid = Fork(beginning);
+    const int reason = errno;
     ::close(out[1]);
     ::close(err[1]);
     output = out[0];
@@ -127,12 +145,14 @@ bool ChildProcess::Read(int* descriptor, std::string* text) {
 }
 
 void ChildProcess::Stop() const {
-    if (IsRunning())
-        ::kill(pid, SIGTERM);
+    if (!IsRunning())
+        return;
+    ::kill(pid, SIGTERM);
+    ::kill(pid, SIGCONT); // a suspended process takes no signal before
 }
 
 bool ChildProcess::HasEnded(int* exitCode) {
-    return Wait(WNOHANG, exitCode);
+    return IsRunning() && Wait(WNOHANG, exitCode);
 }
 
 bool ChildProcess::Wait(int options, int* exitCode) {

@@ -18,7 +18,9 @@ class ChildProcess {
     ChildProcess(ChildProcess&& other) noexcept;
     ChildProcess& operator=(ChildProcess&& other) noexcept;
 
-    /// `arguments` without the program's name.
+    /// `arguments` without the program's name. A program that is not there ends with 127 and its
+    /// reason on Errors(). Called by a thread that outlives the child, which takes that thread's
+    /// end for the parent's.
     Status Start(const std::string& program, const std::vector<std::string>& arguments);
 
     bool IsRunning() const { return pid > 0; }
@@ -34,7 +36,6 @@ class ChildProcess {
     bool HasEnded(int* exitCode);
 
   private:
-    int Fork(const char* program, char* const* arguments, int writeOutput, int writeErrors);
     static bool Read(int* descriptor, std::string* text);
     void Close();
     /// `options` as waitpid takes them.

@@ -1,8 +1,6 @@
 #include "apps/cli/launcher.h"
 
-#include <algorithm>
 #include <array>
-#include <cstdint>
 #include <cstdlib>
 
 #include "base/number_text.h"
@@ -12,20 +10,32 @@ namespace ryn::cli {
 
 namespace {
 
-/// A launcher that counts its processes from a first number on.
-struct Launcher {
-    const char* number;
-    const char* count; ///< how many processes it started; null where it does not tell
-    int first;
+constexpr const char* kArrayTask = "SLURM_ARRAY_TASK_ID";
+constexpr const char* kSequence = "PARALLEL_SEQ";
+
+/// Processes started together, each with its rank from 0.
+struct Group {
+    const char* sign; ///< set where this launcher started the process
+    const char* rank;
+    const char* size; ///< null where it does not tell
 };
 
-// In this order: an array's task may itself start something under mpirun or srun, which then knows
-// better; a shell under parallel may be a task of an array.
-constexpr std::array kLaunchers = {
-    Launcher{"OMPI_COMM_WORLD_RANK", "OMPI_COMM_WORLD_SIZE", 0},
-    Launcher{"PMI_RANK", "PMI_SIZE", 0},
-    Launcher{"PARALLEL_SEQ", nullptr, 1},
+// The innermost first: mpirun starts its helpers by srun, whose numbers the ranks then inherit.
+// SLURM_PROCID and SLURM_NTASKS stand in a batch script as well, of which there is only one; the
+// count of a step's tasks does not.
+constexpr std::array kGroups = {
+    Group{"OMPI_COMM_WORLD_RANK", "OMPI_COMM_WORLD_RANK", "OMPI_COMM_WORLD_SIZE"},
+    Group{"PMI_RANK", "PMI_RANK", "PMI_SIZE"},
+    Group{"SLURM_STEP_NUM_TASKS", "SLURM_PROCID", "SLURM_STEP_NUM_TASKS"},
+    Group{"PMIX_RANK", "PMIX_RANK", nullptr},
 };
+
+const Group* GroupIn(const Environment& environment) {
+    for (const Group& group : kGroups)
+        if (environment(group.sign))
+            return &group;
+    return nullptr;
+}
 
 Status ReadNumber(const Environment& environment, const char* name, int* number) {
     const std::string text = environment(name).value_or("");
@@ -36,52 +46,96 @@ Status ReadNumber(const Environment& environment, const char* name, int* number)
     return Status::Ok();
 }
 
-/// 64 bits: a variable may hold any number, from which the first one is still taken away.
-Status Take(const char* name, std::int64_t number, int parts, int* part) {
+/// Leaves the number as it is where the variable is not set.
+Status ReadIfSet(const Environment& environment, const char* name, int* number) {
+    return environment(name) ? ReadNumber(environment, name, number) : Status::Ok();
+}
+
+Status Take(const char* name, long long number, int parts, int* part) {
     if (number < 1 || number > parts)
         return Status::InputFault(FormatText(kTextCliLauncherOutside, name, number, parts));
     *part = static_cast<int>(number);
     return Status::Ok();
 }
 
-Status TakeRank(const Environment& environment, const Launcher& launcher, int parts, int* part) {
-    int number = 0;
-    if (Status read = ReadNumber(environment, launcher.number, &number); !read)
-        return read;
-    int count = parts;
-    if (launcher.count != nullptr && environment(launcher.count))
-        if (Status read = ReadNumber(environment, launcher.count, &count); !read)
-            return read;
-    if (count != parts)
-        return Status::InputFault(FormatText(kTextCliLauncherCount, launcher.count, count, parts));
-    return Take(launcher.number, std::int64_t{number} - launcher.first + 1, parts, part);
+Status OtherCount(const char* name, int count, int parts) {
+    return Status::InputFault(FormatText(kTextCliLauncherCount, name, count, parts));
 }
 
-Status TakeArrayTask(const Environment& environment, int parts, int* part) {
-    constexpr const char* kId = "SLURM_ARRAY_TASK_ID";
+Status TakeRank(const Environment& environment, const Group& group, int parts, int* part) {
+    int rank = 0;
+    int size = parts;
+    Status read = ReadNumber(environment, group.rank, &rank);
+    if (read && group.size != nullptr)
+        read = ReadIfSet(environment, group.size, &size);
+    if (!read)
+        return read;
+    if (size != parts)
+        return OtherCount(group.size, size, parts);
+    return Take(group.rank, rank + 1LL, parts, part);
+}
+
+struct ArrayTask {
     int id = 0;
-    int count = 0;
-    if (Status read = ReadNumber(environment, kId, &id); !read)
-        return read;
-    if (environment("SLURM_ARRAY_TASK_COUNT"))
-        if (Status read = ReadNumber(environment, "SLURM_ARRAY_TASK_COUNT", &count); !read)
-            return read;
-    if (count != parts || parts == 1)
-        return Take(kId, parts == 1 ? 1 : id, parts, part);
-    int first = 0;
+    int count = 0; ///< of tasks; 0 where Slurm does not tell
+    int first = 1;
     int step = 1;
-    if (Status read = ReadNumber(environment, "SLURM_ARRAY_TASK_MIN", &first); !read)
-        return read;
-    if (environment("SLURM_ARRAY_TASK_STEP"))
-        if (Status read = ReadNumber(environment, "SLURM_ARRAY_TASK_STEP", &step); !read)
-            return read;
-    return Take(kId, (std::int64_t{id} - first) / std::max(step, 1) + 1, parts, part);
+};
+
+Status ReadArrayTask(const Environment& environment, ArrayTask* task) {
+    Status read = ReadNumber(environment, kArrayTask, &task->id);
+    if (read)
+        read = ReadIfSet(environment, "SLURM_ARRAY_TASK_COUNT", &task->count);
+    if (read)
+        read = ReadIfSet(environment, "SLURM_ARRAY_TASK_MIN", &task->first);
+    if (read)
+        read = ReadIfSet(environment, "SLURM_ARRAY_TASK_STEP", &task->step);
+    return read;
 }
 
-/// A process alone is no share: srun and mpirun set their variables for one process too, such as an
-/// array's task that runs the program under them.
-bool StartedOneOnly(const Environment& environment, const Launcher& launcher) {
-    return launcher.count != nullptr && environment(launcher.count) == "1";
+/// Only an array of all parts tells where its numbers begin: tasks submitted again are an array of
+/// their own, whose first number is that of one of them.
+Status TakeArrayTask(const Environment& environment, int parts, int* part) {
+    ArrayTask task;
+    if (Status read = ReadArrayTask(environment, &task); !read)
+        return read;
+    if (task.count > parts)
+        return OtherCount("SLURM_ARRAY_TASK_COUNT", task.count, parts);
+    if (task.count == parts) {
+        const long long place = static_cast<long long>(task.id) - task.first;
+        const bool isOnStep = task.step > 0 && place % task.step == 0;
+        return Take(kArrayTask, isOnStep ? place / task.step + 1 : 0, parts, part);
+    }
+    return Take(kArrayTask, task.id, parts, part)
+               ? Status::Ok()
+               : Status::InputFault(
+                     FormatText(kTextCliLauncherLoneTask, kArrayTask, task.id, parts));
+}
+
+Status TakeSequence(const Environment& environment, int parts, int* part) {
+    int number = 0;
+    const Status read = ReadNumber(environment, kSequence, &number);
+    return read ? Take(kSequence, number, parts, part) : read;
+}
+
+/// An array's task and a command of GNU parallel at once: which of the two lies within the other is
+/// not to be seen, since jobs inherit the variables of the shell that submitted them.
+Status TakeAgreed(const Environment& environment, int parts, int* part) {
+    int task = 0;
+    int sequence = 0;
+    Status taken = TakeArrayTask(environment, parts, &task);
+    if (taken)
+        taken = TakeSequence(environment, parts, &sequence);
+    if (taken && task != sequence)
+        return Status::InputFault(
+            FormatText(kTextCliLauncherDisagree, kArrayTask, task, kSequence, sequence));
+    if (taken)
+        *part = task;
+    return taken;
+}
+
+bool IsAlone(const Environment& environment, const Group& group) {
+    return group.size != nullptr && environment(group.size) == "1";
 }
 
 } // namespace
@@ -94,17 +148,18 @@ Environment ProcessEnvironment() {
 }
 
 Status PartOfLauncher(const Environment& environment, int parts, int* part) {
-    for (const Launcher& launcher : kLaunchers)
-        if (environment(launcher.number) && (parts == 1 || !StartedOneOnly(environment, launcher)))
-            return TakeRank(environment, launcher, parts, part);
-    if (environment("SLURM_ARRAY_TASK_ID"))
+    const bool isTask = environment(kArrayTask).has_value();
+    const bool isInSequence = environment(kSequence).has_value();
+    const Group* const group = GroupIn(environment);
+    // "srun ryn ..." in an array's task, or under parallel, is a group of one.
+    if (group != nullptr && !((isTask || isInSequence) && IsAlone(environment, *group)))
+        return TakeRank(environment, *group, parts, part);
+    if (isTask && isInSequence)
+        return TakeAgreed(environment, parts, part);
+    if (isTask)
         return TakeArrayTask(environment, parts, part);
-    // Set in every job, so that it counts only where srun started as many processes.
-    if (environment("SLURM_PROCID"))
-        return TakeRank(environment, {"SLURM_PROCID", "SLURM_NTASKS", 0}, parts, part);
-    for (const Launcher& launcher : kLaunchers) // tells what does not fit
-        if (environment(launcher.number))
-            return TakeRank(environment, launcher, parts, part);
+    if (isInSequence)
+        return TakeSequence(environment, parts, part);
     return Status::InputFault(FormatText(kTextCliLauncherNone, parts));
 }
 

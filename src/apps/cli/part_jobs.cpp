@@ -1,6 +1,7 @@
 #include "apps/cli/part_jobs.h"
 
 #include <algorithm>
+#include <cstring>
 #include <poll.h>
 
 #include "apps/cli/child_process.h"
@@ -19,6 +20,12 @@ struct Job {
     std::string errors;
 };
 
+/// A process that was killed, as for want of memory, could not say so itself.
+std::string EndBySignalText(int signal) {
+    const char* const name = ::sigdescr_np(signal);
+    return FormatText(kTextCliGridPartKilled, signal, std::string(name != nullptr ? name : "?"));
+}
+
 /// All parts, from the first start to the last end.
 class Supervisor {
   public:
@@ -31,10 +38,7 @@ class Supervisor {
             Start(running.back());
         }
         while (!running.empty()) {
-            if (!end.wasStopped && end.part == 0 && jobs.isStopped && jobs.isStopped()) {
-                end.wasStopped = true;
-                StopAll();
-            }
+            StopIfAsked();
             Await();
             for (Job& job : running)
                 Read(job);
@@ -50,7 +54,7 @@ class Supervisor {
         job.process = ChildProcess();
         const Status started = job.process.Start(jobs.program, jobs.argumentsOf(job.part));
         if (!started)
-            Fail(job, kExitSystem, started.Text() + "\n");
+            Fail(job, kExitSystem, started.Text());
     }
 
     void Fail(const Job& job, int exitCode, const std::string& errors) {
@@ -59,6 +63,13 @@ class Supervisor {
         end.part = job.part;
         end.exitCode = exitCode;
         end.errors = errors;
+        StopAll();
+    }
+
+    void StopIfAsked() {
+        if (end.wasStopped || end.part != 0 || !jobs.isStopped || !jobs.isStopped())
+            return;
+        end.wasStopped = true;
         StopAll();
     }
 
@@ -95,15 +106,16 @@ class Supervisor {
     }
 
     void TakeFailure(Job& job, int exitCode) {
+        constexpr int kSignals = 128;
         constexpr int kFirstOfSystem = 126; // cannot be started, or ended by a signal
-        constexpr int kBySignal = 128;
         const bool died = exitCode == kExitSystem || exitCode >= kFirstOfSystem;
-        if (exitCode > kBySignal)
-            job.errors += FormatText(kTextCliGridPartKilled, exitCode - kBySignal) + "\n";
+        // A signal to the whole process group may have ended the part: then this one has it too.
+        StopIfAsked();
         if (died && job.starts < 2 && end.part == 0 && !end.wasStopped)
-            Start(job);
-        else
-            Fail(job, died ? kExitSystem : exitCode, job.errors);
+            return Start(job);
+        if (exitCode > kSignals)
+            job.errors += "ryn: " + EndBySignalText(exitCode - kSignals) + '\n';
+        Fail(job, died ? kExitSystem : exitCode, job.errors);
     }
 
     const PartJobs& jobs;

@@ -23,7 +23,8 @@ struct PartJobsEnd {
     int exitCode = 0; ///< of the part that failed; 0 when all did their work
     int part = 0;     ///< the one that failed; 0 for none
     bool wasStopped = false;
-    std::string errors; ///< what the part that failed wrote on its standard error last
+    std::string errors; ///< what the part that failed wrote on its standard error last, and
+                        ///< the signal where one ended it
 };
 
 /// Runs the parts to their end. One that died, by a signal or with kExitSystem, is started a second

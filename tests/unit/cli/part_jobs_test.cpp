@@ -4,12 +4,11 @@
 #include <csignal>
 #include <filesystem>
 #include <fstream>
-#include <map>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "apps/cli/launcher.h"
+#include "base/stop_signals.h"
 #include "support/temporary_directory.h"
 
 namespace ryn::cli {
@@ -89,46 +88,79 @@ TEST(PartJobs, TellThatAProgramCannotBeStarted) {
     PartJobs jobs;
     jobs.program = "/nonexistent/program";
     jobs.argumentsOf = [](int) { return std::vector<std::string>(); };
-    EXPECT_EQ(RunPartJobs(jobs).exitCode, 3);
+    const PartJobsEnd end = RunPartJobs(jobs);
+    EXPECT_EQ(end.exitCode, 3);
+    EXPECT_EQ(end.errors, "ryn: /nonexistent/program: No such file or directory\n");
 }
 
-/// The part that an environment makes of one of `parts`; 0 where it is refused.
-int PartIn(const std::map<std::string, std::string>& variables, int parts) {
-    int part = 0;
-    const Environment environment = [&](const std::string& name) -> std::optional<std::string> {
-        const auto found = variables.find(name);
-        return found != variables.end() ? std::optional(found->second) : std::nullopt;
+/// Gives a signal a disposition while it lives.
+class Disposition {
+  public:
+    Disposition(int of, void (*handler)(int)) : signal(of), before(::signal(of, handler)) {}
+    ~Disposition() { ::signal(signal, before); }
+    Disposition(const Disposition&) = delete;
+    Disposition& operator=(const Disposition&) = delete;
+
+  private:
+    int signal;
+    void (*before)(int);
+};
+
+// A stop that comes between a part's fork and its exec must not be lost in the handlers that the
+// part has from this process until then.
+TEST(PartJobs, StopPartsThatHaveOnlyJustBeenStarted) {
+    const StopSignals signals;
+    for (int i = 0; i < 20; ++i) {
+        ScriptedJobs run("exec sleep 20");
+        run.jobs.isStopped = [] { return true; };
+        const auto start = std::chrono::steady_clock::now();
+        EXPECT_TRUE(RunPartJobs(run.jobs).wasStopped);
+        ASSERT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(10));
+    }
+}
+
+// A signal to the whole process group ends a part before the request to stop has been seen.
+TEST(PartJobs, StartNoPartAgainWhenAllAreToStop) {
+    ScriptedJobs run("touch over; kill -9 $$");
+    run.jobs.parts = 1;
+    int starts = 0;
+    run.jobs.argumentsOf = [&, before = run.jobs.argumentsOf](int part) {
+        ++starts;
+        return before(part);
     };
-    const Status status = PartOfLauncher(environment, parts, &part);
-    EXPECT_EQ(status ? 0 : 1, part == 0 ? 1 : 0) << status.Text();
-    return part;
+    run.jobs.isStopped = [&] { return run.directory.Has("over"); };
+    EXPECT_TRUE(RunPartJobs(run.jobs).wasStopped);
+    EXPECT_EQ(starts, 1);
 }
 
-TEST(Launcher, GivesAProcessItsNumber) {
-    EXPECT_EQ(PartIn({{"OMPI_COMM_WORLD_RANK", "0"}, {"OMPI_COMM_WORLD_SIZE", "2"}}, 2), 1);
-    EXPECT_EQ(PartIn({{"PMI_RANK", "3"}, {"PMI_SIZE", "4"}}, 4), 4);
-    EXPECT_EQ(PartIn({{"PARALLEL_SEQ", "3"}}, 4), 3);
-    EXPECT_EQ(PartIn({{"SLURM_PROCID", "1"}, {"SLURM_NTASKS", "2"}}, 2), 2);
-    const auto array = [](const char* id, const char* first, const char* step, const char* count) {
-        return std::map<std::string, std::string>{
-            {"SLURM_ARRAY_TASK_ID", id},     {"SLURM_ARRAY_TASK_MIN", first},
-            {"SLURM_ARRAY_TASK_STEP", step}, {"SLURM_ARRAY_TASK_COUNT", count},
-            {"SLURM_PROCID", "0"},           {"SLURM_NTASKS", "1"}};
-    };
-    EXPECT_EQ(PartIn(array("1", "1", "1", "4"), 4), 1);
-    EXPECT_EQ(PartIn(array("0", "0", "1", "4"), 4), 1);
-    EXPECT_EQ(PartIn(array("14", "10", "2", "4"), 4), 3);
-    EXPECT_EQ(PartIn(array("3", "3", "1", "1"), 4), 3); // submitted again, alone
-    EXPECT_EQ(PartIn(array("0", "0", "1", "1"), 1), 1);
+TEST(PartJobs, StopAPartThatIsSuspended) {
+    ScriptedJobs run("touch there; kill -STOP $$; exec sleep 20");
+    run.jobs.parts = 1;
+    run.jobs.isStopped = [&] { return run.directory.Has("there"); };
+    const auto start = std::chrono::steady_clock::now();
+    EXPECT_TRUE(RunPartJobs(run.jobs).wasStopped);
+    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(10));
 }
 
-TEST(Launcher, IsRefusedWhereItsNumberDoesNotFit) {
-    EXPECT_EQ(PartIn({}, 2), 0);
-    EXPECT_EQ(PartIn({{"OMPI_COMM_WORLD_RANK", "0"}, {"OMPI_COMM_WORLD_SIZE", "3"}}, 2), 0);
-    EXPECT_EQ(PartIn({{"PARALLEL_SEQ", "5"}}, 4), 0);
-    EXPECT_EQ(PartIn({{"PARALLEL_SEQ", "one"}}, 4), 0);
-    EXPECT_EQ(PartIn({{"SLURM_ARRAY_TASK_ID", "0"}, {"SLURM_ARRAY_TASK_COUNT", "1"}}, 4), 0);
-    EXPECT_EQ(PartIn({{"SLURM_PROCID", "0"}, {"SLURM_NTASKS", "1"}}, 4), 0);
+TEST(PartJobs, TellBySignalsNameWhatEndedAPart) {
+    ScriptedJobs run("echo halfway >&2; kill -9 $$");
+    run.jobs.parts = 1;
+    const PartJobsEnd end = RunPartJobs(run.jobs);
+    EXPECT_EQ(end.exitCode, 3);
+    EXPECT_EQ(end.errors, "halfway\nryn: ended by signal 9 (Killed)\n");
+}
+
+TEST(PartJobs, KeepASignalIgnoredThatTheirParentIgnores) {
+    const Disposition nohup(SIGHUP, SIG_IGN);
+    ScriptedJobs run("kill -HUP $$; touch done$1");
+    EXPECT_EQ(RunPartJobs(run.jobs).exitCode, 0);
+    EXPECT_TRUE(run.directory.Has("done1"));
+}
+
+TEST(PartJobs, SeeHowPartsEndWhereTheCallerIgnoresTheEndOfChildren) {
+    const Disposition ignored(SIGCHLD, SIG_IGN);
+    ScriptedJobs run("exit 1");
+    EXPECT_EQ(RunPartJobs(run.jobs).exitCode, 1);
 }
 
 } // namespace
