@@ -143,6 +143,15 @@ def add_two_processes(table, batch):
               processor(spent["two"]) / processor(spent["one"]))
 
 
+def print_split(program, batch):
+    """What a point costs by step, in milliseconds of processor time."""
+    lines = run([*ONE_CORE, program.resolve().parent / "ryn_grid_split", batch.case]).printed
+    print("\nryn grid, milliseconds a point, 60 years of days (writing: results taken into the "
+          "grids, last point's files, output file)")
+    print(lines, end="")
+    print(f"all {sum(float(line.split()[1]) for line in lines.splitlines()):.4f}")
+
+
 def add_sizes(table, program):
     batches = {name: Batch(program, make_grid(*size)) for name, size in
                {"small": (40, 25, 6), "large": (400, 250, 6),
@@ -161,5 +170,6 @@ def add(table, program):
     batch = Batch(ryn, grid)
     add_rivals(table, batch, grid)
     add_two_processes(table, batch)
+    print_split(program, batch)
     add_sizes(table, ryn)
     shutil.rmtree(WORK)

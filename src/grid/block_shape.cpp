@@ -69,4 +69,13 @@ std::vector<Run> CutRun(const Run& run, std::size_t chunk, std::size_t length) {
     return pieces;
 }
 
+std::vector<Run> CutEvenly(const Run& run, std::size_t pieces) {
+    std::vector<Run> cut;
+    for (std::size_t i = 0; i < pieces; ++i) {
+        const std::size_t first = run.count * i / pieces;
+        cut.push_back({run.start + first, run.count * (i + 1) / pieces - first});
+    }
+    return cut;
+}
+
 } // namespace ryn

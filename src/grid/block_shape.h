@@ -25,4 +25,8 @@ struct Run {
 /// chunk in which the run begins, so that no chunk is cut when the length is made of whole ones.
 std::vector<Run> CutRun(const Run& run, std::size_t chunk, std::size_t length);
 
+/// Cuts a run into so many pieces, of which none is longer than another by more than 1. `pieces`
+/// is 1 to run.count.
+std::vector<Run> CutEvenly(const Run& run, std::size_t pieces);
+
 } // namespace ryn

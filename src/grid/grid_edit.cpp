@@ -184,6 +184,10 @@ EGridEditErrors CGridEditEngine::PlanTiles(const GridTile& whole, std::size_t me
     return grid ? Take(grid->PlanTiles(whole, memoryLimit, tiles), kGridBadRequest) : NoFile();
 }
 
+std::size_t CGridEditEngine::BytesForValues(std::size_t memoryLimit) {
+    return memoryLimit - GridFile::ScratchOf(memoryLimit);
+}
+
 EGridEditErrors CGridEditEngine::DividePlane(const GridTile& whole, int pieces,
                                              std::vector<GridTile>* tiles) {
     return grid ? Take(grid->DividePlane(whole, pieces, tiles), kGridBadRequest) : NoFile();

@@ -168,9 +168,12 @@ class CGridEditEngine {
     /// one point.
     EGridEditErrors PlanTiles(const GridTile& whole, std::size_t memoryLimit,
                               std::vector<GridTile>* tiles);
+    /// What a limit of memory leaves for a tile's values.
+    static std::size_t BytesForValues(std::size_t memoryLimit);
     /// Cuts a part of the grid into `pieces` tiles or some more, of about the same size, along what
     /// lies furthest apart in the file: for processes that share the work. The same file, part and
-    /// number give the same tiles everywhere. Chunks are kept whole where there are enough of them.
+    /// number give the same tiles everywhere. Chunks are kept whole where there are enough of them;
+    /// without chunks there are as many tiles as wanted, as even as can be.
     EGridEditErrors DividePlane(const GridTile& whole, int pieces, std::vector<GridTile>* tiles);
     /// Reads a tile point by point: the steps of a point lie together, and point (firstX + i,
     /// firstY + j) begins at (i * countY + j) * countSteps. `memoryLimit` is the one that the tile

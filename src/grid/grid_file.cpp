@@ -101,7 +101,18 @@ Status GridFile::DividePlane(const GridTile& whole, int pieces,
                              std::vector<GridTile>* tiles) const {
     if (Status status = CheckTile(whole); !status)
         return status;
-    *tiles = CutPlane(whole, std::max<std::size_t>(1, whole.Points() / Size(std::max(1, pieces))));
+    const std::size_t count = Size(std::max(1, pieces));
+    const Run x = RunOf(layout.x, whole.firstX, whole.countX);
+    const Run y = RunOf(layout.y, whole.firstY, whole.countY);
+    const bool isXFaster = Item(whole.item).xPlace > Item(whole.item).yPlace;
+    const Triple chunk = BlockReader(file, Item(whole.item), whole.layer).Chunk();
+    const bool isChunked = chunk[1] > 1 || chunk[2] > 1;
+    if (isChunked || (isXFaster ? y : x).count < count)
+        *tiles = CutPlane(whole, std::max<std::size_t>(1, whole.Points() / count));
+    else if (isXFaster)
+        *tiles = TilesOf(whole, {x}, CutEvenly(y, count));
+    else
+        *tiles = TilesOf(whole, CutEvenly(x, count), {y});
     return Status::Ok();
 }
 
@@ -117,17 +128,23 @@ std::vector<GridTile> GridFile::CutPlane(const GridTile& whole, std::size_t poin
     const std::array<std::size_t, 2> extent = {isXFaster ? y.count : x.count,
                                                isXFaster ? x.count : y.count};
     const std::vector<std::size_t> shape = BlockShape(chunks, extent, points);
-    std::vector<GridTile> planned;
-    for (const Run& along : CutRun(x, chunk[2], shape[isXFaster ? 1 : 0]))
-        for (const Run& across : CutRun(y, chunk[1], shape[isXFaster ? 0 : 1])) {
+    return TilesOf(whole, CutRun(x, chunk[2], shape[isXFaster ? 1 : 0]),
+                   CutRun(y, chunk[1], shape[isXFaster ? 0 : 1]));
+}
+
+std::vector<GridTile> GridFile::TilesOf(const GridTile& whole, const std::vector<Run>& x,
+                                        const std::vector<Run>& y) const {
+    std::vector<GridTile> tiles;
+    for (const Run& along : x)
+        for (const Run& across : y) {
             GridTile tile = whole;
             tile.firstX = FirstOf(layout.x, along);
             tile.countX = static_cast<int>(along.count);
             tile.firstY = FirstOf(layout.y, across);
             tile.countY = static_cast<int>(across.count);
-            planned.push_back(tile);
+            tiles.push_back(tile);
         }
-    return planned;
+    return tiles;
 }
 
 std::size_t GridFile::ScratchOf(std::size_t limitBytes) {

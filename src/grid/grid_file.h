@@ -7,6 +7,7 @@
 #include <string>
 #include <vector>
 
+#include "grid/block_shape.h"
 #include "grid/grid_header.h"
 #include "grid/grid_records.h"
 #include "grid/layout.h"
@@ -57,6 +58,9 @@ class GridFile {
     }
     /// Tiles of at most `points` places.
     std::vector<GridTile> CutPlane(const GridTile& whole, std::size_t points) const;
+    /// The tiles whose sides are these runs along the axes as stored.
+    std::vector<GridTile> TilesOf(const GridTile& whole, const std::vector<Run>& x,
+                                  const std::vector<Run>& y) const;
     Status ReadInto(const GridTile& tile, std::array<std::ptrdiff_t, 3> stride,
                     std::size_t scratchBytes, std::span<float> values) const;
 

@@ -169,6 +169,7 @@ bool PartRun::RunTiles(std::size_t first, std::size_t end) {
     const std::optional<std::size_t> memory = run.MemoryForTile();
     if (!memory)
         return false;
+    const std::size_t most = CGridEditEngine::BytesForValues(*memory);
     for (std::size_t i = first; i < end;) {
         if (Stands(i)) {
             Print(kTextGridTileStands, i++);
@@ -178,7 +179,7 @@ bool PartRun::RunTiles(std::size_t first, std::size_t end) {
         std::size_t past = i + 1;
         for (; past < end && !Stands(past); ++past) {
             const std::optional<GridTile> both = Joined(group, tiles[past]);
-            if (!both || both->Values() * sizeof(float) > *memory / 4 * 3) // reading takes some too
+            if (!both || both->Values() * sizeof(float) > most)
                 break;
             group = *both;
         }

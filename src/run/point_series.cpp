@@ -149,7 +149,7 @@ Status PointSeries::ForEachPoint(const GridTile& whole, const std::vector<GridTi
     for (const GridTile& part : parts)
         left.push_back(part.Points());
     for (const GridTile& tile : tiles) {
-        tileValues.resize(tile.Values());
+        const std::span<float> tileValues = buffer.Take(tile.Values());
         if (engine.ReadTile(tile, memory, tileValues) != kGridOk)
             return engine.LastError();
         for (std::size_t i = 0; i < parts.size(); ++i) {

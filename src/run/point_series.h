@@ -10,6 +10,7 @@
 #include "grid/grid_edit.h"
 #include "run/grid_plan.h"
 #include "run/scratch_files.h"
+#include "run/tile_buffer.h"
 #include "run/tsq0_file_info.h"
 
 namespace ryn {
@@ -89,7 +90,7 @@ class PointSeries {
     std::string startTime;
     std::vector<double> seconds; ///< of each step, from the first one used
     int withMissing = 0;
-    std::vector<float> tileValues;  ///< their memory serves the next tile
+    TileBuffer buffer;
     const float* history = nullptr; ///< of the point being used
     std::map<int, std::vector<float>> kept;
 };

@@ -118,6 +118,21 @@ TEST(GridTiles, AreLongRunsOfWhatIsNotChunked) {
         EXPECT_EQ(tile.countY, 17);
 }
 
+TEST(GridTiles, DivideAPlaneEvenlyWhereItIsNotChunked) {
+    for (const std::size_t layout : {std::size_t{0}, std::size_t{1}, std::size_t{2}}) {
+        OpenGrid grid(FileOf(layout));
+        std::vector<GridTile> tiles;
+        ASSERT_EQ(grid.engine.DividePlane(grid.Whole(), 5, &tiles), kGridOk);
+        ASSERT_EQ(tiles.size(), 5U);
+        std::size_t points = 0;
+        for (const GridTile& tile : tiles) {
+            points += tile.Points();
+            EXPECT_NEAR(static_cast<double>(tile.Points()), 23.0 * 17.0 / 5.0, 23.0);
+        }
+        EXPECT_EQ(points, std::size_t{23 * 17});
+    }
+}
+
 TEST(GridTiles, AreRefusedWhereOnePointIsTooLarge) {
     OpenGrid grid(FileOf(0));
     std::vector<GridTile> tiles;

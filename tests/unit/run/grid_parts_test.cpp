@@ -109,6 +109,22 @@ TEST(GridParts, GoOnWhereTheyWereKilled) {
     EXPECT_THAT(merge->TilesIn(State::Taken), SizeIs(count));
 }
 
+// Tiles that are read in one go are not lost in one go.
+TEST(GridParts, LeaveEachTileWhenItsPointsAreDone) {
+    SampleBatch batch(HistoryOfParts());
+    CRynEditDoc document;
+    document.UsePorts(batch.ports);
+    document.OnOpenDocument(batch.directory.Path("case.RYN"));
+    GridBatchOptions options = batch.Options(Scratch::Memory);
+    options.isStopped = [&batch] { return batch.directory.Has("out.nc.tiles/2of10"); };
+    EXPECT_EQ(RunGridPart(document, options, {1, 1}).end, BatchEnd::Stopped);
+    EXPECT_TRUE(batch.directory.Has("out.nc.tiles/1of10"));
+    EXPECT_FALSE(batch.directory.Has("out.nc.tiles/3of10"));
+    EXPECT_EQ(RunPart(batch, 1, 1).end, BatchEnd::Written);
+    EXPECT_THAT(batch.printed,
+                AllOf(HasSubstr("tile 2 of 10 stands"), HasSubstr("3 of 10 written")));
+}
+
 TEST(GridParts, RefuseTilesThatWereMadeFromSomethingElse) {
     SampleBatch batch(HistoryOfParts());
     RunPart(batch, 1, 1);
