@@ -6,6 +6,7 @@
 #include "apps/cli/case_file.h"
 #include "apps/cli/command_options.h"
 #include "apps/cli/finding_lines.h"
+#include "apps/cli/grid_case.h"
 #include "apps/cli/json_output.h"
 #include "apps/cli/plain_text.h"
 #include "strings/catalogue.h"
@@ -21,6 +22,17 @@ Json JsonOfFindings(const CMessageList& findings) {
     return list;
 }
 
+/// A batch over a grid brings a series file of its own to each point.
+void DropFindingsOnInput(CMessageList& findings) {
+    const std::string_view text = Text(kTextInputFileMissing);
+    std::erase_if(findings, [&](const CMessage& finding) { return finding.text == text; });
+}
+
+Status TestGrid(CaseFile& file) {
+    Status tested = TestGridSettings(file);
+    return tested ? TestGridPlan(file) : tested;
+}
+
 } // namespace
 
 int RunCheck(const CheckOptions& options, Console& console) {
@@ -29,6 +41,11 @@ int RunCheck(const CheckOptions& options, Console& console) {
         return refused;
     CMessageList findings;
     file.Root().Check(findings, 1);
+    if (file.Root().GridInput().UseTsq2Input) {
+        DropFindingsOnInput(findings);
+        if (const Status grid = TestGrid(file); !grid)
+            return Report(console, grid);
+    }
     if (options.form == OutputForm::Json)
         PrintJson(console, JsonOfFindings(findings));
     else

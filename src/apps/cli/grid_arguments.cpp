@@ -93,11 +93,13 @@ Status NoName(const char* option) {
 }
 
 /// The results are written over nothing but a file of earlier ones.
-Status TestOutput(const std::string& output, const std::string& grid) {
+Status TestOutput(const std::string& output, const std::string& grid, const std::string& caseFile) {
     if (output.empty())
         return NoName("--grid-out");
     if (grid == output || IsSameFile(grid, output))
         return About("--grid-out", Status::InputFault(FormatText(kTextCliOverInput, output)));
+    if (caseFile == output || IsSameFile(caseFile, output))
+        return About("--grid-out", Status::InputFault(FormatText(kTextGridOutputTaken, output)));
     const Status replaceable = TestReplaceable(output, Consent::Given);
     return replaceable ? replaceable : About("--grid-out", replaceable);
 }
@@ -117,7 +119,7 @@ Status TakeRanges(const GridArguments& arguments, const CGridEditHeaderInfo& hea
 } // namespace
 
 Status ApplyGridArguments(const GridArguments& arguments, const std::string& callerDirectory,
-                          CTsq2InputKvf& input) {
+                          const std::string& caseFile, CTsq2InputKvf& input) {
     if (Status fault = TestTogether(arguments); !fault || !arguments.grid)
         return fault;
     const std::string grid = AbsoluteName(*arguments.grid, callerDirectory);
@@ -126,7 +128,7 @@ Status ApplyGridArguments(const GridArguments& arguments, const std::string& cal
         return NoName("--grid");
     if (Status readable = TestReadable(grid); !readable)
         return About("--grid", readable);
-    if (Status free = TestOutput(output, grid); !free)
+    if (Status free = TestOutput(output, grid, caseFile); !free)
         return free;
     CGridEditEngine engine;
     if (engine.OpenFile(grid, true) != kGridOk)

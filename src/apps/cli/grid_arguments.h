@@ -19,9 +19,10 @@ struct GridArguments {
 };
 
 /// Fills section Tsq2Input. The grid is opened: what is not given is the whole axis, and what is
-/// given must be there. Files count from `callerDirectory`. Nothing happens without any of the
-/// options. After a fault, one line that names the option, the section is to be thrown away.
+/// given must be there. Files count from `callerDirectory`, but for the
+/// absolute `caseFile`, which the results may not take the place of. Nothing happens without any of
+/// the options. After a fault, one line that names the option, the section is to be thrown away.
 Status ApplyGridArguments(const GridArguments& arguments, const std::string& callerDirectory,
-                          CTsq2InputKvf& input);
+                          const std::string& caseFile, CTsq2InputKvf& input);
 
 } // namespace ryn::cli

@@ -12,6 +12,7 @@
 #include "apps/cli/case_file.h"
 #include "apps/cli/command_options.h"
 #include "apps/cli/engine_log.h"
+#include "apps/cli/grid_case.h"
 #include "apps/cli/grid_progress.h"
 #include "apps/cli/input_file.h"
 #include "apps/cli/launcher.h"
@@ -28,26 +29,6 @@
 namespace ryn::cli {
 
 namespace {
-
-/// What would go wrong at the first point, and at every other.
-Status TestSettings(CaseFile& file) {
-    const CBasicInputKvf& basic = file.Root().BasicInput();
-    if (basic.SelectionMethod != file.Root().DefineEVS().SelectionMethod)
-        return Status::InputFault(FormatText(kTextCliGridMethodsDiffer, file.ShownName(),
-                                             basic.SelectionMethod,
-                                             file.Root().DefineEVS().SelectionMethod));
-    // Written so that NaN, which a hand-edited file can hold, is refused too.
-    if (basic.SelectionMethod == kSelectPartialDurations && !(basic.AvgAnNum > 0.0))
-        return Status::InputFault(FormatText(kTextCliGridNoRate, file.ShownName()));
-    // The number of peaks is the rate times this, and none is no series.
-    if (basic.SelectionMethod == kSelectPartialDurations &&
-        basic.PdsDataType != kPartialDurationsByThreshold && !(basic.RecordLength > 0.0))
-        return Status::InputFault(FormatText(kTextCliGridNoRecordLength, file.ShownName()));
-    const CTsq2InputKvf& input = file.Root().GridInput();
-    return input.UseTsq2Input && !input.Tsq2InputFile.empty()
-               ? TestReadable(FullPath(input.Tsq2InputFile, SplitPath(file.Path()).directory))
-               : Status::Ok();
-}
 
 void ShowCounts(const BatchCounts& counts, Console& console) {
     if (counts.withMissing > 0)
@@ -254,7 +235,7 @@ int RunGrid(const GridOptions& options, Console& console) {
         CaseFile file(console, Consent::Given);
         if (const int refused = file.Open(options.file))
             return refused;
-        if (const int refused = Report(console, TestSettings(file)))
+        if (const int refused = Report(console, TestGridSettings(file)))
             return refused;
         exitCode = RunAsAsked(options, file, console);
     }

@@ -15,8 +15,9 @@ int RunNew(const NewOptions& options, Console& console) {
     if (const int refused = file.New(options.file))
         return refused;
     // Assignments come after, so that one to a keyword that --grid fills counts.
-    if (const int refused = Report(
-            console, ApplyGridArguments(options.grid, callerDirectory, file.Root().GridInput())))
+    if (const int refused =
+            Report(console, ApplyGridArguments(options.grid, callerDirectory, file.Path(),
+                                               file.Root().GridInput())))
         return refused;
     if (const int refused =
             Report(console, ApplyArguments(file.Root(), options.arguments, callerDirectory)))

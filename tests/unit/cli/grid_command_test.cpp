@@ -78,6 +78,16 @@ TEST_F(GridCommand, RefusesWhatWouldGoWrongAtTheFirstPoint) {
     }
 }
 
+TEST_F(GridCommand, IsCheckedWithItsGridAndWithoutASeries) {
+    SampleHistory().Write("grid.nc");
+    ASSERT_EQ(New({}), 0) << err;
+    EXPECT_EQ(Run({"check", "case.ryn"}), 0) << out;
+    ASSERT_EQ(Run({"set", "case.ryn", "Tsq2Input.Tsq2ItemNo=7"}), 0) << err;
+    EXPECT_EQ(Run({"check", "case.ryn"}), 1);
+    EXPECT_THAT(err, HasSubstr("grid.nc: "));
+    EXPECT_EQ(std::count(err.begin(), err.end(), '\n'), 1) << err;
+}
+
 TEST_F(GridCommand, SaysWhyNoPointWasGood) {
     SampleHistory history;
     history.steps = 20;
@@ -100,7 +110,9 @@ TEST_F(GridCommand, WarnsOfMissingValuesThatCountAsData) {
     history.Write("grid.nc");
     ASSERT_EQ(New({}), 0) << err;
     EXPECT_EQ(Run({"grid", "case.ryn"}), 0);
-    EXPECT_THAT(err, HasSubstr("2 points have missing values after the first time step"));
+    EXPECT_THAT(
+        err,
+        HasSubstr("points with missing values after the first time step, which count as data: 2"));
 }
 
 TEST(SizeText, IsReadWithItsSuffix) {

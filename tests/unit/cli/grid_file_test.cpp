@@ -167,6 +167,14 @@ TEST_F(InfoOfGrid, RefusesWhatIsNeitherGridNorSeriesInOneLine) {
     EXPECT_EQ(std::count(err.begin(), err.end(), '\n'), 1) << err;
 }
 
+TEST_F(NewOfGrid, RefusesToWriteResultsOverTheAnalysisOrTheGrid) {
+    WritePacked("q.nc");
+    for (const std::string output : {"q.nc", "case.ryn", "./case.ryn"}) {
+        EXPECT_EQ(New({"--grid", "q.nc", "--grid-item", "1", "--grid-out", output}), 1) << output;
+        EXPECT_THAT(err, HasSubstr("--grid-out: ")) << output;
+    }
+}
+
 TEST_F(NewOfGrid, TakesTheWholeGridUnlessRangesAreGiven) {
     WritePacked("q.nc");
     ASSERT_EQ(New({"--grid", "q.nc", "--grid-item", "1", "--grid-out", "out.nc"}), 0) << err;
