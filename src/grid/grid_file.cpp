@@ -56,7 +56,7 @@ int FirstOf(const SpatialAxis& axis, const Run& run) {
 
 Status GridFile::Open(const std::string& path, std::unique_ptr<GridFile>* result) {
     auto opened = std::make_unique<GridFile>();
-    if (Status status = NcFile::Open(path, &opened->file); !status)
+    if (Status status = NcFile::Open(path, &opened->file, NcRuns::Short); !status)
         return status;
     if (Status status = FindGrid(opened->file, &opened->layout); !status)
         return status;

@@ -19,7 +19,9 @@ constexpr std::size_t kMaxTextBytes = 65536;
 constexpr std::size_t kMaxNumbers = 1024;
 // The library's window on a classic file. Its own default reads a series half as fast, and a large
 // one is filled anew whenever the reading goes from the times to the values.
-constexpr std::size_t kWindowBytes = 65536;
+constexpr std::size_t kWindowOfLongRuns = 65536;
+// Of short runs a larger one would read what lies between them too.
+constexpr std::size_t kWindowOfShortRuns = 4096;
 
 Status CheckRegular(int descriptor, const std::string& path, std::uint64_t* size) {
     struct stat info {};
@@ -80,7 +82,7 @@ void NcFile::Close() {
     handle = kClosed;
 }
 
-Status NcFile::Open(const std::string& path, NcFile* file) {
+Status NcFile::Open(const std::string& path, NcFile* file, NcRuns runs) {
     NcFile opened;
     opened.path = path;
     // Without O_NONBLOCK a named pipe without a writer would stop the program here.
@@ -91,7 +93,7 @@ Status NcFile::Open(const std::string& path, NcFile* file) {
         return status;
     {
         const auto lock = LockNetcdf();
-        std::size_t window = kWindowBytes;
+        std::size_t window = runs == NcRuns::Short ? kWindowOfShortRuns : kWindowOfLongRuns;
         const int code = nc__open(descriptor.Name().c_str(), NC_NOWRITE, &window, &opened.handle);
         if (code != NC_NOERR) {
             opened.handle = kClosed;

@@ -28,6 +28,12 @@ struct NcVariable {
 /// Stands for the file where an attribute's variable is asked for.
 inline constexpr int kNcGlobal = -1;
 
+/// How a file is going to be read; only the speed depends on it.
+enum class NcRuns {
+    Long, ///< whole variables
+    Short ///< a part of each of many steps
+};
+
 /// A netCDF file open for reading: classic, CDF-5 or netCDF-4, of which the root group is seen.
 /// What a file says is checked against its size as far as the format allows (CheckContainer).
 class NcFile {
@@ -38,7 +44,7 @@ class NcFile {
     NcFile& operator=(NcFile&& other) noexcept;
 
     /// Refused with a reason: no regular file, no netCDF file, a cut file, counts that lie.
-    static Status Open(const std::string& path, NcFile* file);
+    static Status Open(const std::string& path, NcFile* file, NcRuns runs = NcRuns::Long);
 
     const std::string& Path() const { return path; }
     NcContainer Container() const { return container; }

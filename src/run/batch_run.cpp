@@ -99,12 +99,13 @@ bool BatchRun::Prepare() {
 
 /// A grid that stays in the system's cache is read in tiles of a size that the processor's caches
 /// and its address tables serve well; for one that does not, long runs on the disk count for more.
+/// Of parts that run side by side each takes new memory, which costs more than shorter runs do.
 std::size_t BatchRun::TileBytes(double allowed) const {
-    constexpr double kWellServed = 256 * kMebibyte;
+    const double wellServed = (share == BatchShare::Whole ? 256 : 96) * kMebibyte;
     const double whole = static_cast<double>(Plan().Whole().Values()) * sizeof(float);
     const bool staysInCache = whole <= static_cast<double>(UsableMemory()) / 2;
     const double least = 16.0 * Plan().Steps();
-    return static_cast<std::size_t>(staysInCache ? std::min(allowed, std::max(kWellServed, least))
+    return static_cast<std::size_t>(staysInCache ? std::min(allowed, std::max(wellServed, least))
                                                  : allowed);
 }
 

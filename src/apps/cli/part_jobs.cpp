@@ -81,12 +81,18 @@ class Supervisor {
     /// Until a part writes or ends, or it is time to ask whether to stop.
     void Await() {
         constexpr int kMilliseconds = 100;
+        constexpr int kWhileOneEnds = 2; // its pipes are closed some time before it has ended
+        int timeout = kMilliseconds;
         std::vector<pollfd> watched;
-        for (const Job& job : running)
+        for (const Job& job : running) {
+            const auto before = watched.size();
             for (const int descriptor : {job.process.Output(), job.process.Errors()})
                 if (descriptor >= 0)
                     watched.push_back({descriptor, POLLIN, 0});
-        ::poll(watched.data(), watched.size(), kMilliseconds);
+            if (watched.size() == before)
+                timeout = kWhileOneEnds;
+        }
+        ::poll(watched.data(), watched.size(), timeout);
     }
 
     void Read(Job& job) {
