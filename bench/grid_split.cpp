@@ -168,9 +168,9 @@ class SplitRun {
     GridPlan plan;
 };
 
-double Median(std::vector<double> values) {
+double Median(std::array<double, kRounds> values) {
     std::sort(values.begin(), values.end());
-    return values[values.size() / 2];
+    return values[kRounds / 2];
 }
 
 void Print(SplitRun& run) {
@@ -182,13 +182,13 @@ void Print(SplitRun& run) {
         Step{"reading", &Split::reading},       Step{"series", &Split::series},
         Step{"extraction", &Split::extraction}, Step{"trees", &Split::trees},
         Step{"engine", &Split::engine},         Step{"writing", &Split::writing}};
-    std::vector<Split> rounds;
-    for (int i = 0; i < kRounds; ++i)
-        rounds.push_back(run.Round());
+    std::array<Split, kRounds> rounds;
+    for (Split& round : rounds)
+        round = run.Round();
     for (const Step& step : kSteps) {
-        std::vector<double> seconds;
-        for (const Split& round : rounds)
-            seconds.push_back(round.*step.seconds);
+        std::array<double, kRounds> seconds{};
+        std::transform(rounds.begin(), rounds.end(), seconds.begin(),
+                       [&step](const Split& round) { return round.*step.seconds; });
         std::printf("%s %.4f\n", step.name, 1e3 * Median(seconds) / run.Points());
     }
 }

@@ -146,6 +146,7 @@ Status PointSeries::ForEachPoint(const GridTile& whole, const std::vector<GridTi
     if (engine.PlanTiles(whole, memory, &tiles) != kGridOk)
         return engine.LastError();
     std::vector<std::size_t> left; // cells of each part that are not done
+    left.reserve(parts.size());
     for (const GridTile& part : parts)
         left.push_back(part.Points());
     for (const GridTile& tile : tiles) {
